@@ -1,0 +1,75 @@
+#pragma once
+
+#include <filesystem>
+#include <functional>
+#include <iosfwd>
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "HomePlatform/Json/JsonValue.h"
+#include "HomePlatform/PlatformCall.h"
+#include "HomePlatform/Result.h"
+#include "HomePlatform/Store/HomeData.h"
+#include "PlatformModel/NDPlatform.h"
+
+namespace nidus {
+
+/// How a platform is opened.
+struct HomePlatformOptions {
+  /// Where the database, the preferences and the vocabulary are; it is made when it is missing.
+  /// None keeps everything in memory, uses the built-in vocabulary alone and touches no file.
+  std::optional<std::filesystem::path> dataFolder;
+  /// Whether the device is locked.
+  bool locked = false;
+  /// Runs all work on the thread that drains (`drain`, or a wait): no thread is started, and a wait
+  /// that nothing can end is over at once, as if its time had passed.
+  bool drainsOnCaller = false;
+  /// The metric flag; none takes it from the environment's locale.
+  std::optional<bool> metric;
+  /// Preferences of a platform in memory.
+  std::map<std::string, JsonValue> preferences;
+  /// The "InternalBuild" answer of a platform in memory.
+  bool internalBuild = false;
+  /// Takes each message that the log passes on; empty sends it to standard error and the system
+  /// log.
+  std::function<void(const NDSystemLogMessage&)> logSink;
+  /// Hears of each call on a home, before it is answered; may be empty. On any thread.
+  std::function<void(const PlatformCall&)> callObserver;
+};
+
+/// The home platform of one machine: homes from a database, accessories behind drivers.
+///
+/// Opened by the host, registered by it (`NDPlatform::registerPlatform`), and shut down before the
+/// process ends. May be used from any thread unless said otherwise.
+///
+///     auto platform = HomePlatform::open({.dataFolder = folder});
+///     if (!platform) return report(platform.failure());
+class HomePlatform : public NDPlatform {
+ public:
+  [[nodiscard]] static Result<std::shared_ptr<HomePlatform>> open(HomePlatformOptions options);
+
+  /// Puts `homes` into the database: in place of all (or, with `merge`, of those of the same UUID)
+  /// in one transaction; afterwards sets "kHomesConfigured" to whether there are homes.
+  [[nodiscard]] virtual Status importHomes(const std::vector<HomeData>& homes, bool merge) = 0;
+  /// The homes as the database has them now.
+  [[nodiscard]] virtual Result<std::vector<HomeData>> exportHomes() = 0;
+
+  virtual void setLocked(bool locked) = 0;
+  /// Managers that are created from then on never report their homes, or do again.
+  virtual void setSilent(bool silent) = 0;
+  /// Changes preferences (null removes the key) and posts the change notification.
+  [[nodiscard]] virtual Status changePreferences(
+      const std::map<std::string, JsonValue>& changes) = 0;
+
+  /// Runs work until every queue of the platform is idle: on the calling thread, which also drains
+  /// the main queue. Not to be called from a queue.
+  virtual void drain() = 0;
+  /// Ends all work and tells the delegates of managers that have not reported that they never will.
+  /// Commands that are pending are freed. The platform can not be used afterwards.
+  virtual void shutDown() = 0;
+};
+
+}  // namespace nidus

@@ -1,0 +1,48 @@
+#pragma once
+
+#include <cstdint>
+#include <filesystem>
+#include <memory>
+#include <optional>
+#include <utility>
+#include <vector>
+
+#include "HomePlatform/Result.h"
+#include "HomePlatform/Store/HomeData.h"
+
+namespace nidus {
+
+/// One value that changes in the database.
+struct ValueChange {
+  NDUUID home;
+  CharacteristicAddress address;
+  std::optional<NDValueRef> value;        ///< The new cached value; none leaves it.
+  std::optional<NDValueRef> deviceValue;  ///< The new device value; none leaves it.
+};
+
+/// The home database: one SQLite file, or one in memory.
+///
+/// May be used from any thread and by several processes; every change is one transaction that is
+/// on disk when the call returns. A failure's message names the file and the remedy.
+class HomeStore {
+ public:
+  /// Opens the database in `file`, making or migrating it as needed; none opens one in memory.
+  [[nodiscard]] static Result<std::unique_ptr<HomeStore>> open(
+      const std::optional<std::filesystem::path>& file);
+  virtual ~HomeStore() = default;
+
+  /// Replaces all homes.
+  [[nodiscard]] virtual Status replaceHomes(const std::vector<HomeData>& homes) = 0;
+  /// Replaces the homes of the same UUID in their places and adds the others at the end.
+  [[nodiscard]] virtual Status mergeHomes(const std::vector<HomeData>& homes) = 0;
+  /// Reads all homes in order, within one transaction.
+  [[nodiscard]] virtual Result<std::vector<HomeData>> loadHomes() = 0;
+  [[nodiscard]] virtual Result<std::int64_t> countHomes() = 0;
+  /// Writes all of `changes`, or none; an address that is no longer there is passed over.
+  [[nodiscard]] virtual Status writeValues(const std::vector<ValueChange>& changes) = 0;
+  /// A number that differs after each change of the database by another connection or process, and
+  /// after each `replaceHomes` and `mergeHomes` of this one; `writeValues` of this one keeps it.
+  [[nodiscard]] virtual Result<std::uint64_t> version() = 0;
+};
+
+}  // namespace nidus

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "PlatformModel/System/NDString.h"
+#include "PlatformModel/System/NDValue.h"
+
+namespace nidus {
+
+/// Converts `value` to a metadata format: "bool" takes any number (non-zero is true), the integer
+/// formats any number that lies in their range after rounding half away from zero, "float" any
+/// number, "string" a text; no format, or another one, takes anything but null as it is.
+/// Gives null when the value is null or does not fit; the same object when nothing changes.
+[[nodiscard]] NDValueRef convertToFormat(const NDValueRef& value, const NDString& format);
+
+}  // namespace nidus

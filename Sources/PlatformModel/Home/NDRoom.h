@@ -1,0 +1,26 @@
+#pragma once
+
+#include <memory>
+
+#include "PlatformModel/System/NDExport.h"
+#include "PlatformModel/System/NDString.h"
+#include "PlatformModel/System/NDUUID.h"
+
+namespace nidus {
+
+class NDHome;
+
+/// A room of a home. Implemented by the platform; owned by its home; immutable; may be
+/// read from any thread. Equality is identity.
+class ND_EXPORT NDRoom {
+ public:
+  virtual ~NDRoom();
+  /// Unique within the home.
+  [[nodiscard]] virtual const NDUUID& uuid() const = 0;
+  /// Never null.
+  [[nodiscard]] virtual const NDString& name() const = 0;
+  /// Null once the home is gone.
+  [[nodiscard]] virtual std::shared_ptr<NDHome> home() const = 0;
+};
+
+}  // namespace nidus

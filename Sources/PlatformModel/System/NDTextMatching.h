@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string_view>
+
+#include "PlatformModel/System/NDExport.h"
+
+namespace nidus {
+
+/// Says whether two UTF-8 texts are equal when diacritics are ignored, letter case kept: after
+/// canonical decomposition and removal of the nonspacing marks. Bytes that are not UTF-8 match
+/// only themselves. May be called from any thread; allocates nothing when both texts are ASCII.
+[[nodiscard]] ND_EXPORT bool isEqualIgnoringDiacritics(std::string_view a, std::string_view b);
+
+/// Says whether `text` contains `part` when the case of ASCII letters is ignored. The empty part
+/// is contained in every text. May be called from any thread.
+[[nodiscard]] ND_EXPORT bool containsIgnoringCase(std::string_view text, std::string_view part);
+
+}  // namespace nidus

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <memory>
+#include <string_view>
+#include <vector>
+
+#include "PlatformModel/System/NDExport.h"
+#include "PlatformModel/System/NDString.h"
+
+namespace nidus {
+
+class NDURL;
+/// A URL or null.
+using NDURLRef = std::shared_ptr<const NDURL>;
+
+/// A URL as an immutable object. Nothing is escaped or unescaped; what was given is what is read.
+/// May be used from any thread.
+///
+///     NDURLRef url = NDURL::make("x-corvane-nidus", "local", "/home?id=1");
+///     url->text();                // "x-corvane-nidus://local/home?id=1"
+///     url->pathComponents()[1];   // "home"
+class ND_EXPORT NDURL {
+ public:
+  /// Builds `scheme://host` followed by `path`, which may carry a query. Never null; each call
+  /// gives a new object.
+  [[nodiscard]] static NDURLRef make(std::string_view scheme, std::string_view host,
+                                     std::string_view path);
+  /// Takes any text as it stands; a text without a scheme has a null scheme. Never null.
+  [[nodiscard]] static NDURLRef fromText(NDString text);
+
+  /// The whole text, never null.
+  [[nodiscard]] const NDString& text() const noexcept { return text_; }
+  /// The part before the first colon; null without a colon.
+  [[nodiscard]] NDString scheme() const;
+  /// "/" followed by the path's components without their slashes; empty without a path.
+  [[nodiscard]] std::vector<NDString> pathComponents() const;
+  /// What follows the first "?" up to a "#"; null without a "?".
+  [[nodiscard]] NDString query() const;
+
+  /// For the factories alone.
+  explicit NDURL(NDString text) : text_(std::move(text)) {}
+
+ private:
+  [[nodiscard]] std::string_view path() const noexcept;
+
+  NDString text_;
+};
+
+}  // namespace nidus

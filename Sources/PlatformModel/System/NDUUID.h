@@ -1,0 +1,56 @@
+#pragma once
+
+#include <array>
+#include <compare>
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string_view>
+
+#include "PlatformModel/System/NDExport.h"
+#include "PlatformModel/System/NDString.h"
+
+namespace nidus {
+
+/// A 128-bit universally unique identifier. A plain value; may be used from any thread.
+class ND_EXPORT NDUUID {
+ public:
+  /// The number of characters of the canonical text.
+  static constexpr std::size_t kTextLength = 36;
+
+  /// Makes the UUID whose bits are all zero.
+  constexpr NDUUID() noexcept = default;
+  explicit constexpr NDUUID(const std::array<std::uint8_t, 16>& bytes) noexcept : bytes_(bytes) {}
+
+  /// Makes a random UUID (version 4) from the system's random source.
+  [[nodiscard]] static NDUUID random();
+
+  /// Reads the 8-4-4-4-12 form in either letter case; none for anything else.
+  [[nodiscard]] static std::optional<NDUUID> fromText(std::string_view text) noexcept;
+
+  /// Gives the canonical text: upper case, 8-4-4-4-12.
+  [[nodiscard]] NDString UUIDString() const;
+
+  /// Writes the canonical text, `kTextLength` characters without a terminator, to `out`.
+  void writeText(char* out) const noexcept;
+
+  [[nodiscard]] constexpr const std::array<std::uint8_t, 16>& bytes() const noexcept {
+    return bytes_;
+  }
+  friend constexpr auto operator<=>(const NDUUID&, const NDUUID&) noexcept = default;
+
+ private:
+  std::array<std::uint8_t, 16> bytes_{};
+};
+
+}  // namespace nidus
+
+template <>
+struct std::hash<nidus::NDUUID> {
+  std::size_t operator()(const nidus::NDUUID& uuid) const noexcept {
+    std::size_t mixed = 0;
+    for (const std::uint8_t byte : uuid.bytes()) mixed = mixed * 131 + byte;
+    return mixed;
+  }
+};

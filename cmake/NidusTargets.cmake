@@ -1,0 +1,52 @@
+# What every target of the project has in common.
+
+find_package(Threads REQUIRED)
+find_program(NIDUS_CCACHE ccache)
+if(NIDUS_CCACHE)
+  set(CMAKE_CXX_COMPILER_LAUNCHER ${NIDUS_CCACHE})
+endif()
+
+set(NIDUS_SANITIZE "" CACHE STRING "Sanitizers of all targets, such as address,undefined")
+option(NIDUS_WERROR "Treat warnings as errors" OFF)
+
+# The programs lie beside their libraries as they will when installed, so that a build tree works
+# the way an installation does.
+set(CMAKE_RUNTIME_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/bin)
+set(CMAKE_LIBRARY_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+set(CMAKE_ARCHIVE_OUTPUT_DIRECTORY ${PROJECT_BINARY_DIR}/lib)
+set(NIDUS_MODULE_DIRECTORY ${PROJECT_BINARY_DIR}/lib/nidus)
+
+add_library(NidusOptions INTERFACE)
+target_compile_options(NidusOptions INTERFACE
+  -Wall -Wextra -Wpedantic -Wshadow -Wconversion
+  $<$<BOOL:${NIDUS_WERROR}>:-Werror>
+  $<$<CXX_COMPILER_ID:Clang>:-Wthread-safety>)
+target_link_options(NidusOptions INTERFACE -Wl,-z,relro,-z,now)
+target_link_libraries(NidusOptions INTERFACE Threads::Threads)
+if(NIDUS_SANITIZE)
+  target_compile_options(NidusOptions INTERFACE
+    -fsanitize=${NIDUS_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
+  target_link_options(NidusOptions INTERFACE -fsanitize=${NIDUS_SANITIZE})
+endif()
+
+# nidus_library(NAME STATIC|SHARED|MODULE): a library of all sources and headers of the current
+# folder and those below it. Headers are included as "NAME-OF-FOLDER/Header.h" and stand on their
+# own.
+function(nidus_library name kind)
+  file(GLOB_RECURSE sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
+  file(GLOB_RECURSE headers CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.h)
+  add_library(${name} ${kind} ${sources})
+  target_sources(${name} PUBLIC FILE_SET HEADERS
+    BASE_DIRS ${PROJECT_SOURCE_DIR}/Sources FILES ${headers})
+  target_link_libraries(${name} PRIVATE NidusOptions)
+endfunction()
+
+# nidus_test(NAME [LIBRARIES...]): a GoogleTest program of all sources of the current folder and
+# those below it; every test becomes a test of CTest.
+function(nidus_test name)
+  file(GLOB_RECURSE sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
+  add_executable(${name} ${sources})
+  target_include_directories(${name} PRIVATE ${PROJECT_SOURCE_DIR}/Tests)
+  target_link_libraries(${name} PRIVATE NidusOptions ${ARGN} GTest::gmock GTest::gtest_main)
+  gtest_discover_tests(${name} DISCOVERY_MODE PRE_TEST)
+endfunction()
