@@ -27,6 +27,8 @@ struct HomePlatformOptions {
   /// Runs all work on the thread that drains (`drain`, or a wait): no thread is started, and a wait
   /// that nothing can end is over at once, as if its time had passed.
   bool drainsOnCaller = false;
+  /// The clock of all waits; null takes the machine's, or, with `drainsOnCaller`, the jumping one.
+  std::shared_ptr<NDClock> clock;
   /// The metric flag; none takes it from the environment's locale.
   std::optional<bool> metric;
   /// Preferences of a platform in memory.
