@@ -3,19 +3,23 @@
 #include <string>
 #include <string_view>
 
+#include "HomePlatform/Json/JsonValue.h"
 #include "PlatformModel/System/NDDictionary.h"
 #include "PlatformModel/System/NDValue.h"
 
 namespace nidus {
 
-/// Appends JSON to a text. A float is the shortest decimal that reads back as the same 32-bit float
-/// and always has a fraction or an exponent. Text must be valid UTF-8 and is written unescaped
-/// where JSON allows it.
+/// Each appends JSON to `out`, on one line.
+
+/// `text` must be valid UTF-8 and is written unescaped where JSON allows it.
 void appendJsonText(std::string& out, std::string_view text);
+/// The shortest decimal that reads back as the same 32-bit float, always with a fraction or an
+/// exponent. JSON has neither infinities nor not-a-number: they become `null`.
 void appendJsonFloat(std::string& out, float value);
-/// Null is `null`.
+/// A null reference is `null`.
 void appendJsonValue(std::string& out, const NDValueRef& value);
 void appendJson(std::string& out, const NDDictionaryValue& value);
 void appendJson(std::string& out, const NDDictionary& dictionary);
+void appendJson(std::string& out, const JsonValue& value);
 
 }  // namespace nidus

@@ -1,7 +1,9 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <variant>
 #include <vector>
@@ -18,6 +20,7 @@ struct JsonValue {
   using Object = std::vector<Member>;  ///< In the order of the text; no key stands twice.
   std::variant<std::nullptr_t, bool, std::int64_t, float, std::string, Array, Object> content =
       nullptr;
+  friend bool operator==(const JsonValue&, const JsonValue&) = default;
 };
 
 /// Something wrong with a document: thrown inside the readers, turned into a `Failure` at their
@@ -27,12 +30,13 @@ struct JsonError {
   std::string message;  ///< What was expected.
 };
 
-/// Makes the failure that people see: `file: place: message`.
+/// Makes the failure that people see: `file: place: message`, on one line.
 [[nodiscard]] Failure failureOf(const JsonError& error, const std::string& fileName);
 
 /// Reads one JSON text whole. Strict: throws `JsonError` for anything but one value of valid UTF-8,
 /// for a key that stands twice, an integer beyond 64 bits, a float beyond 32-bit range, and for
-/// nesting beyond `kJsonMaximumDepth`.
+/// nesting beyond `kJsonMaximumDepth`. A number that is too small for a float becomes 0.0; a byte
+/// order mark before the text is passed over. The message of a syntax error names line and column.
 inline constexpr std::size_t kJsonMaximumDepth = 64;
 [[nodiscard]] JsonValue parseJson(std::string_view text);
 

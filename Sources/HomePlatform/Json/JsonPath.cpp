@@ -1,0 +1,26 @@
+#include "HomePlatform/Json/JsonPath.h"
+
+namespace nidus {
+
+void appendPointerStep(std::string& place, std::string_view key) {
+  place += '/';
+  for (const char c : key) {
+    if (c == '~') {
+      place += "~0";
+    } else if (c == '/') {
+      place += "~1";
+    } else {
+      place += c;
+    }
+  }
+}
+
+std::string JsonPath::place() const {
+  std::string place = base_;
+  for (const Step& step : steps_) {
+    appendPointerStep(place, step.isArray ? std::to_string(step.index) : step.key);
+  }
+  return place;
+}
+
+}  // namespace nidus

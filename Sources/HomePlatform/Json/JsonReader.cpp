@@ -1,0 +1,254 @@
+#include "HomePlatform/Json/JsonReader.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <istream>
+#include <iterator>
+#include <limits>
+#include <nlohmann/json.hpp>
+#include <system_error>
+#include <unordered_set>
+
+namespace nidus {
+namespace {
+
+/// Bytes on their way into the parser, which would take a zero byte for the end of the text.
+template <class Base>
+class CheckedBytes {
+ public:
+  using iterator_category = std::input_iterator_tag;
+  using value_type = char;
+  using difference_type = std::ptrdiff_t;
+  using pointer = const char*;
+  using reference = char;
+
+  explicit CheckedBytes(Base base) : base_(base) {}
+
+  char operator*() const {
+    const char byte = *base_;
+    if (byte == '\0') throw JsonError{"", "byte " + std::to_string(position_) + ": zero byte"};
+    return byte;
+  }
+  CheckedBytes& operator++() {
+    ++base_;
+    ++position_;
+    return *this;
+  }
+  friend bool operator==(const CheckedBytes& a, const CheckedBytes& b) {
+    return a.base_ == b.base_;
+  }
+  friend bool operator!=(const CheckedBytes& a, const CheckedBytes& b) { return !(a == b); }
+
+ private:
+  Base base_;
+  std::size_t position_ = 1;
+};
+
+/// The keys that one object has had so far. Nearly all objects have a handful, for which a plain
+/// list is the quickest.
+class SeenKeys {
+ public:
+  /// Says whether `key` is new.
+  bool add(const std::string& key) {
+    if (many_.empty() && few_.size() < kFew) {
+      if (std::find(few_.begin(), few_.end(), key) != few_.end()) return false;
+      few_.push_back(key);
+      return true;
+    }
+    if (many_.empty()) many_.insert(few_.begin(), few_.end());
+    return many_.insert(key).second;
+  }
+
+ private:
+  static constexpr std::size_t kFew = 16;
+  std::vector<std::string> few_;
+  std::unordered_set<std::string> many_;
+};
+
+bool isInteger(std::string_view number) {
+  return number.find_first_of(".,eE") == std::string_view::npos;
+}
+
+/// "line 2, column 7: unexpected …" out of the parser's message, without the text that it read
+/// last, which may be anything.
+std::string syntaxMessage(std::string_view what) {
+  const std::size_t line = what.find("line ");
+  if (line != std::string_view::npos) what.remove_prefix(line);
+  return std::string(what.substr(0, what.find("; last read: ")));
+}
+
+/// Takes the parser's events, checks what the parser leaves unchecked, and passes them on.
+class CheckingHandler {
+ public:
+  using number_integer_t = nlohmann::json::number_integer_t;
+  using number_unsigned_t = nlohmann::json::number_unsigned_t;
+  using number_float_t = nlohmann::json::number_float_t;
+  using string_t = nlohmann::json::string_t;
+  using binary_t = nlohmann::json::binary_t;
+
+  explicit CheckingHandler(JsonEvents& events) : events_(events) {}
+
+  bool null() { return scalar({nullptr}); }
+  bool boolean(bool value) { return scalar({value}); }
+  bool number_integer(number_integer_t value) {  // NOLINT(readability-identifier-naming): parser's
+    return scalar({std::int64_t{value}});
+  }
+  bool number_unsigned(number_unsigned_t value) {  // NOLINT(readability-identifier-naming)
+    if (value > static_cast<number_unsigned_t>(std::numeric_limits<std::int64_t>::max())) {
+      failBeyondRange(true);
+    }
+    return scalar({static_cast<std::int64_t>(value)});
+  }
+  /// The parser's own value is a 64-bit float, and rounding twice may miss the nearest one: the
+  /// text decides.
+  bool number_float(number_float_t,
+                    const string_t& text) {  // NOLINT(readability-identifier-naming)
+    if (isInteger(text)) failBeyondRange(true);
+    std::string number = text;
+    std::replace(number.begin(), number.end(), ',', '.');  // the parser writes the locale's point
+    return scalar({nearestFloat(number)});
+  }
+  bool string(string_t& text) { return scalar({std::move(text)}); }
+  bool binary(binary_t&) { return false; }
+
+  bool start_object(std::size_t) {  // NOLINT(readability-identifier-naming)
+    checkDepth();
+    events_.beginObject(path_);
+    path_.enterObject();
+    openObjects_.emplace_back();
+    return true;
+  }
+  bool key(string_t& key) {
+    path_.setKey(key);
+    if (!openObjects_.back().add(key)) throw JsonError{path_.place(), "the key stands twice"};
+    events_.key(key, path_);
+    return true;
+  }
+  bool end_object() {  // NOLINT(readability-identifier-naming)
+    openObjects_.pop_back();
+    path_.leave();
+    events_.endObject(path_);
+    path_.endValue();
+    return true;
+  }
+  bool start_array(std::size_t) {  // NOLINT(readability-identifier-naming)
+    checkDepth();
+    events_.beginArray(path_);
+    path_.enterArray();
+    return true;
+  }
+  bool end_array() {  // NOLINT(readability-identifier-naming)
+    path_.leave();
+    events_.endArray(path_);
+    path_.endValue();
+    return true;
+  }
+  // NOLINTNEXTLINE(readability-identifier-naming)
+  bool parse_error(std::size_t, const std::string& token, const nlohmann::json::exception& error) {
+    constexpr int kNumberOverflow = 406;
+    if (error.id == kNumberOverflow) failBeyondRange(isInteger(token));
+    if (isEmpty_ && token.empty()) throw JsonError{"", "the document is empty"};
+    throw JsonError{"", syntaxMessage(error.what())};
+  }
+
+ private:
+  bool scalar(JsonValue value) {
+    isEmpty_ = false;
+    events_.scalar(std::move(value), path_);
+    path_.endValue();
+    return true;
+  }
+
+  void checkDepth() {
+    isEmpty_ = false;
+    if (path_.depth() < kJsonMaximumDepth) return;
+    throw JsonError{path_.place(),
+                    "nested deeper than " + std::to_string(kJsonMaximumDepth) + " levels"};
+  }
+
+  [[nodiscard]] float nearestFloat(const std::string& text) const {
+    float value = 0;
+    const auto read = std::from_chars(text.data(), text.data() + text.size(), value);
+    const bool isTiny = read.ec == std::errc::result_out_of_range && std::abs(value) < 1.0F;
+    if ((read.ec != std::errc() && !isTiny) || !std::isfinite(value)) failBeyondRange(false);
+    return value;
+  }
+
+  [[noreturn]] void failBeyondRange(bool isInteger) const {
+    throw JsonError{path_.place(), isInteger ? "the integer is beyond 64 bits"
+                                             : "the number is beyond the range of a 32-bit float"};
+  }
+
+  JsonEvents& events_;
+  JsonPath path_;
+  std::vector<SeenKeys> openObjects_;
+  bool isEmpty_ = true;
+};
+
+template <class Bytes>
+void readBytes(Bytes begin, Bytes end, JsonEvents& events) {
+  CheckingHandler handler(events);
+  nlohmann::json::sax_parse(CheckedBytes(begin), CheckedBytes(end), &handler);
+}
+
+/// Walks a value that is in memory.
+class Replay {
+ public:
+  Replay(const std::string& base, JsonEvents& events) : events_(events), path_(base) {}
+
+  void pass(const JsonValue& value) {
+    if (const auto* object = std::get_if<JsonValue::Object>(&value.content)) {
+      passObject(*object);
+    } else if (const auto* array = std::get_if<JsonValue::Array>(&value.content)) {
+      passArray(*array);
+    } else {
+      events_.scalar(value, path_);
+    }
+    path_.endValue();
+  }
+
+ private:
+  void passObject(const JsonValue::Object& object) {
+    events_.beginObject(path_);
+    path_.enterObject();
+    for (const auto& [key, value] : object) {
+      path_.setKey(key);
+      events_.key(key, path_);
+      pass(value);
+    }
+    path_.leave();
+    events_.endObject(path_);
+  }
+
+  void passArray(const JsonValue::Array& array) {
+    events_.beginArray(path_);
+    path_.enterArray();
+    for (const JsonValue& element : array) pass(element);
+    path_.leave();
+    events_.endArray(path_);
+  }
+
+  JsonEvents& events_;
+  JsonPath path_;
+};
+
+}  // namespace
+
+void readJson(std::string_view text, JsonEvents& events) {
+  readBytes(text.data(), text.data() + text.size(), events);
+}
+
+void readJson(std::istream& in, JsonEvents& events) {
+  try {
+    readBytes(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>(), events);
+  } catch (const std::ios_base::failure& failure) {
+    throw JsonError{"", "cannot be read: " + failure.code().message()};
+  }
+}
+
+void replayJson(const JsonPlaced& value, JsonEvents& events) {
+  Replay(value.place(), events).pass(value.value());
+}
+
+}  // namespace nidus
