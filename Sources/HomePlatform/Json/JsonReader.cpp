@@ -107,7 +107,7 @@ class CheckingHandler {
     if (isInteger(text)) failBeyondRange(true);
     std::string number = text;
     std::replace(number.begin(), number.end(), ',', '.');  // the parser writes the locale's point
-    return scalar({nearestFloat(number)});
+    return scalar({nearestFloat(number, roughly)});
   }
   bool string(string_t& text) { return scalar({std::move(text)}); }
   bool binary(binary_t&) { return false; }
@@ -167,12 +167,12 @@ class CheckingHandler {
                     "nested deeper than " + std::to_string(kJsonMaximumDepth) + " levels"};
   }
 
-  [[nodiscard]] float nearestFloat(const std::string& text) const {
+  [[nodiscard]] float nearestFloat(const std::string& text, double roughly) const {
     float value = 0;
     const auto read = std::from_chars(text.data(), text.data() + text.size(), value);
-    const bool isTiny = read.ec == std::errc::result_out_of_range && std::abs(value) < 1.0F;
-    if ((read.ec != std::errc() && !isTiny) || !std::isfinite(value)) failBeyondRange(false);
-    return value;
+    if (read.ec == std::errc()) return value;
+    if (std::abs(roughly) >= 1) failBeyondRange(false);
+    return std::signbit(roughly) ? -0.0F : 0.0F;  // too small for a float
   }
 
   [[noreturn]] void failBeyondRange(bool isInteger) const {
