@@ -1,9 +1,7 @@
 #pragma once
 
-#include <optional>
 #include <string>
 #include <string_view>
-#include <variant>
 #include <vector>
 
 #include "PlatformModel/System/NDDictionary.h"
@@ -47,5 +45,6 @@ using HomeObjectRecords = std::vector<HomeObjectRecord>;
 
 /// A record, or a list of records, on one line for log messages.
 [[nodiscard]] std::string description(const HomeObjectRecord& record);
+[[nodiscard]] std::string description(const HomeObjectRecords& records);
 
 }  // namespace nidus

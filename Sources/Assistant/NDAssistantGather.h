@@ -17,8 +17,9 @@ namespace nidus {
 ///
 ///     auto gather = NDAssistantGather::init();      // null: no homes are configured
 ///     gather->startWithCompletionHandler([gather](long count) { ... });
-class NDAssistantGather final : public NDHomeManagerDelegate,
-                                public std::enable_shared_from_this<NDAssistantGather> {
+class NDAssistantGather final : public NDHomeManagerDelegate {
+  struct Passkey {};
+
  public:
   /// Takes the number of homes.
   using CompletionHandler = std::function<void(long count)>;
@@ -27,11 +28,20 @@ class NDAssistantGather final : public NDHomeManagerDelegate,
   /// hold an `NDDeliveryHold` until they have called `startWithCompletionHandler`.
   [[nodiscard]] static std::shared_ptr<NDAssistantGather> init();
 
-  [[nodiscard]] bool fetchComplete() const;
-  [[nodiscard]] std::shared_ptr<NDHomeManager> manager() const;
+  /// For `init` alone.
+  NDAssistantGather(Passkey passkey, std::shared_ptr<NDHomeManager> manager);
 
-  /// Keeps `handler` (never empty) for the first update of the homes; when that has been, calls it
-  /// at once with 0. It runs on the platform's thread of deliveries, or on the caller's.
+  /// Whether the homes have been reported; once true it stays so. May be called from any thread.
+  [[nodiscard]] bool fetchComplete() const;
+  /// Never null. May be called from any thread.
+  [[nodiscard]] const std::shared_ptr<NDHomeManager>& manager() const noexcept { return manager_; }
+  /// What waits for the first update; empty before the start and from the update on.
+  [[nodiscard]] CompletionHandler completionHandler() const;
+
+  /// Keeps `handler` (never empty) for the first update of the homes, in the place of an earlier
+  /// one; when the update has been, calls it at once with 0. It runs once, on the platform's thread
+  /// of deliveries or on the caller's, and is then let go; after the platform has been shut down it
+  /// never runs.
   void startWithCompletionHandler(CompletionHandler handler);
 
   void homeManagerDidUpdateHomes(const std::shared_ptr<NDHomeManager>& manager) override;
@@ -53,6 +63,15 @@ class NDAssistantGather final : public NDHomeManagerDelegate,
                                                        NDURLRef identifier) const;
   void addToList_room(HomeObjectRecords& list, const NDRoom& room) const;
   void addToList_service(HomeObjectRecords& list, const std::shared_ptr<NDService>& service) const;
+
+ private:
+  CompletionHandler takeCompletionHandler();
+
+  const std::shared_ptr<NDHomeManager> manager_;
+  mutable NDMutex mutex_;
+  bool fetchComplete_ ND_GUARDED_BY(mutex_) = false;
+  bool isAbandoned_ ND_GUARDED_BY(mutex_) = false;
+  CompletionHandler completionHandler_ ND_GUARDED_BY(mutex_);
 };
 
 }  // namespace nidus

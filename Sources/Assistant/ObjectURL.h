@@ -1,5 +1,7 @@
 #pragma once
 
+#include <string_view>
+
 #include "PlatformModel/Home/NDHome.h"
 #include "PlatformModel/System/NDURL.h"
 

@@ -1,0 +1,235 @@
+#include "Assistant/NDAssistantGather.h"
+
+#include <utility>
+
+#include "Assistant/HomeMemberships.h"
+#include "Assistant/ObjectURL.h"
+#include "PlatformModel/Assistant/VAHAConstants.h"
+#include "PlatformModel/Home/NDNAPMetadata.h"
+#include "PlatformModel/NDPlatform.h"
+#include "PlatformModel/System/NDNull.h"
+
+namespace nidus {
+namespace {
+
+/// The entity types as texts that all records share. They are made on first use and never
+/// destroyed, because a platform's thread may still gather while the process ends.
+struct EntityTypes {
+  NDString home = VAHAEntityTypeHOMEValue;
+  NDString service = VAHAEntityTypeSERVICEValue;
+  NDString group = VAHAEntityTypeGROUPValue;
+  NDString room = VAHAEntityTypeROOMValue;
+  NDString zone = VAHAEntityTypeZONEValue;
+  NDString scene = VAHAEntityTypeSCENEValue;
+  NDString trigger = VAHAEntityTypeTRIGGERValue;
+};
+
+const EntityTypes& entityTypes() {
+  static const EntityTypes& types = *new EntityTypes;
+  return types;
+}
+
+bool areHomesConfigured() {
+  const auto platform = NDPlatform::registered();
+  if (!platform) return false;
+  const auto reading = platform->preferences()->booleanForKey_domain_container(
+      "kHomesConfigured", "com.corvane.nidusd", getHomeConfigurationPath());
+  return reading.keyExistsAndIsValid && reading.value;
+}
+
+std::shared_ptr<NDHome> primaryHome(const std::shared_ptr<NDHomeManager>& manager) {
+  for (const auto& home : property(manager, &NDHomeManager::homes)) {
+    if (home->isPrimary()) return home;
+  }
+  return nullptr;
+}
+
+/// The types of the characteristics that the assistant can address.
+std::vector<NDString> addressableTypes(const NDService& service, const NDNAPMetadata* metadata) {
+  std::vector<NDString> types;
+  if (!metadata) return types;
+  types.reserve(service.characteristics().size());
+  for (const auto& characteristic : service.characteristics()) {
+    const NDString& type = characteristic->characteristicType();
+    const NDString name = metadata->mapToAssistantCharacteristicName(type);
+    if (name && name != "IDENTIFY") types.push_back(type);
+  }
+  return types;
+}
+
+std::size_t greatestRecordCount(const NDHome& home) {
+  std::size_t count = 1 + home.serviceGroups().size() + home.rooms().size() + home.zones().size() +
+                      home.actionSets().size() + home.triggers().size();
+  for (const auto& accessory : home.accessories()) count += accessory->services().size();
+  return count;
+}
+
+/// Appends the records of one home's objects. What is the same for all of them is read once.
+class HomeFlattener {
+ public:
+  HomeFlattener(HomeObjectRecords& list, const NDHome* home, const NDNAPMetadata* metadata)
+      : list_(list), memberships_(home), metadata_(metadata) {}
+
+  void append(NDString name, NDString type, NDString home, NDURLRef identifier) {
+    HomeObjectRecord& record = list_.emplace_back();
+    record.objectType = std::move(type);
+    record.objectName = std::move(name);
+    record.objectIdentifier = std::move(identifier);
+    record.objectHome = std::move(home);
+  }
+
+  template <class Object>
+  void appendAll(const NDArray<Object>& objects, const NDString& type, const NDString& home) {
+    for (const auto& object : objects) append(object->name(), type, home, url(*object));
+  }
+
+  void appendRoom(const NDRoom& room) {
+    const auto home = room.home();
+    append(room.name(), entityTypes().room, property(home, &NDHome::name), url(room));
+    list_.back().objectZone = memberships_.zoneName(room);
+  }
+
+  void appendService(const NDService& service) {
+    std::vector<NDString> types = addressableTypes(service, metadata_);
+    if (types.empty()) return;
+    const auto accessory = service.accessory();
+    const auto home = property(accessory, &NDAccessory::home);
+    const NDString& homeName = property(home, &NDHome::name);
+    append(service.name(), entityTypes().service, homeName, url(service));
+    HomeObjectRecord& record = list_.back();
+    record.objectServiceType = service.serviceType();
+    record.objectCharacteristics = std::move(types);
+    record.objectAssociatedServiceType = service.associatedServiceType();
+    record.objectGroups = memberships_.groupNames(service);
+    const auto room = property(accessory, &NDAccessory::room);
+    const NDString& roomName = property(room, &NDRoom::name);
+    if (roomName != homeName) record.objectRoom = roomName;
+  }
+
+  void appendHome(const NDHome& home) {
+    const EntityTypes& types = entityTypes();
+    append(home.name(), types.home, nullptr, url(home));
+    for (const auto& accessory : home.accessories()) {
+      for (const auto& service : accessory->services()) appendService(*service);
+    }
+    const NDString& name = home.name();
+    appendAll(home.serviceGroups(), types.group, name);
+    for (const auto& room : home.rooms()) appendRoom(*room);
+    appendAll(home.zones(), types.zone, name);
+    appendAll(home.actionSets(), types.scene, name);
+    appendAll(home.triggers(), types.trigger, name);
+  }
+
+ private:
+  HomeObjectRecords& list_;
+  const HomeMemberships memberships_;
+  const NDNAPMetadata* const metadata_;
+};
+
+}  // namespace
+
+std::shared_ptr<NDAssistantGather> NDAssistantGather::init() {
+  if (!areHomesConfigured()) return nullptr;
+  auto manager = NDHomeManager::create();
+  if (!manager) return nullptr;
+  auto gather = std::make_shared<NDAssistantGather>(Passkey(), std::move(manager));
+  gather->manager()->setDelegate(gather);
+  return gather;
+}
+
+NDAssistantGather::NDAssistantGather(Passkey /*passkey*/, std::shared_ptr<NDHomeManager> manager)
+    : manager_(std::move(manager)) {}
+
+bool NDAssistantGather::fetchComplete() const {
+  const NDLock lock(mutex_);
+  return fetchComplete_;
+}
+
+NDAssistantGather::CompletionHandler NDAssistantGather::completionHandler() const {
+  const NDLock lock(mutex_);
+  return completionHandler_;
+}
+
+void NDAssistantGather::startWithCompletionHandler(CompletionHandler handler) {
+  {
+    const NDLock lock(mutex_);
+    if (!fetchComplete_) {
+      // What leaves the field, or finds it closed, is destroyed after the lock is released.
+      if (!isAbandoned_) completionHandler_.swap(handler);
+      return;
+    }
+  }
+  handler(0);
+  takeCompletionHandler();
+}
+
+void NDAssistantGather::homeManagerDidUpdateHomes(const std::shared_ptr<NDHomeManager>& manager) {
+  {
+    const NDLock lock(mutex_);
+    if (fetchComplete_) return;
+    fetchComplete_ = true;
+  }
+  const CompletionHandler handler = takeCompletionHandler();
+  if (handler) handler(static_cast<long>(manager->homes().size()));
+}
+
+void NDAssistantGather::homeManagerWillNotUpdateHomes(
+    const std::shared_ptr<NDHomeManager>& /*manager*/) {
+  CompletionHandler dropped;
+  const NDLock lock(mutex_);
+  isAbandoned_ = true;
+  dropped.swap(completionHandler_);
+}
+
+NDAssistantGather::CompletionHandler NDAssistantGather::takeCompletionHandler() {
+  CompletionHandler handler;
+  const NDLock lock(mutex_);
+  handler.swap(completionHandler_);
+  return handler;
+}
+
+NDString NDAssistantGather::getPrimaryHomeName() const {
+  const auto home = primaryHome(manager_);
+  return property(home, &NDHome::name);
+}
+
+NDString NDAssistantGather::getPrimaryHomeID() const {
+  const auto home = primaryHome(manager_);
+  return home ? home->uuid().UUIDString() : nullptr;
+}
+
+HomeObjectRecords NDAssistantGather::gatherNidusObjects() const {
+  const NDArray<NDHome> homes = manager_->homes();
+  const auto metadata = NDNAPMetadata::getSharedInstance();
+  std::size_t count = 0;
+  for (const auto& home : homes) count += greatestRecordCount(*home);
+  HomeObjectRecords list;
+  list.reserve(count);
+  for (const auto& home : homes) {
+    HomeFlattener(list, home.get(), metadata.get()).appendHome(*home);
+  }
+  return list;
+}
+
+void NDAssistantGather::addToList_objectWithName_type_home_andIdentifer(HomeObjectRecords& list,
+                                                                        const NDString& name,
+                                                                        const NDString& type,
+                                                                        const NDString& home,
+                                                                        NDURLRef identifier) const {
+  HomeFlattener(list, nullptr, nullptr).append(name, type, home, std::move(identifier));
+}
+
+void NDAssistantGather::addToList_room(HomeObjectRecords& list, const NDRoom& room) const {
+  const auto home = room.home();
+  HomeFlattener(list, home.get(), nullptr).appendRoom(room);
+}
+
+void NDAssistantGather::addToList_service(HomeObjectRecords& list,
+                                          const std::shared_ptr<NDService>& service) const {
+  const auto metadata = NDNAPMetadata::getSharedInstance();
+  const auto accessory = service->accessory();
+  const auto home = property(accessory, &NDAccessory::home);
+  HomeFlattener(list, home.get(), metadata.get()).appendService(*service);
+}
+
+}  // namespace nidus
