@@ -26,6 +26,11 @@ class ND_EXPORT VAHAFilter {
   VAHAFilter& operator=(const VAHAFilter&) = default;
 };
 
+/// Gives the description of `filter`.
+[[nodiscard]] inline std::string description(const VAHAFilter& filter) {
+  return filter.description();
+}
+
 /// Names objects by what they are, what they are called and where they are. Every field may be
 /// null.
 class ND_EXPORT VAHASearchCriteriaFilter : public VAHAFilter {

@@ -41,6 +41,11 @@ class ND_EXPORT VAHAValue {
 /// A value or null.
 using VAHAValueRef = std::shared_ptr<const VAHAValue>;
 
+/// Gives the description of `value`, "(null)" for null.
+[[nodiscard]] inline std::string description(const VAHAValueRef& value) {
+  return value ? value->description() : "(null)";
+}
+
 /// A boolean.
 class ND_EXPORT VAHABooleanValue : public VAHAValue {
  public:

@@ -36,6 +36,7 @@ class ND_EXPORT NDDeliveryHold {
 
  private:
   void release();
+  void releaseWithOuter();
 
   NDDeliveryHold* outer_;
   std::vector<NDTask> held_;

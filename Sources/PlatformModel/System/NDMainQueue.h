@@ -44,6 +44,8 @@ class ND_EXPORT NDMainQueue final : public NDQueue {
 
  private:
   bool take(NDTask& task);
+  std::size_t wakes();
+  void waitForWorkOrWake(std::size_t wakesSeen);
 
   NDMutex mutex_;
   std::condition_variable changed_;

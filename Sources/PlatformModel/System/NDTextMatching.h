@@ -1,5 +1,6 @@
 #pragma once
 
+#include <string>
 #include <string_view>
 
 #include "PlatformModel/System/NDExport.h"
@@ -10,6 +11,10 @@ namespace nidus {
 /// canonical decomposition and removal of the nonspacing marks. Bytes that are not UTF-8 match
 /// only themselves. May be called from any thread; allocates nothing when both texts are ASCII.
 [[nodiscard]] ND_EXPORT bool isEqualIgnoringDiacritics(std::string_view a, std::string_view b);
+
+/// Gives `text` without its diacritics, for tables: two texts have the same key exactly when
+/// `isEqualIgnoringDiacritics` says so. May be called from any thread.
+[[nodiscard]] ND_EXPORT std::string foldDiacritics(std::string_view text);
 
 /// Says whether `text` contains `part` when the case of ASCII letters is ignored. The empty part
 /// is contained in every text. May be called from any thread.

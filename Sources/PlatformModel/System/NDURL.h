@@ -2,6 +2,7 @@
 
 #include <memory>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "PlatformModel/System/NDExport.h"
@@ -30,11 +31,12 @@ class ND_EXPORT NDURL {
 
   /// The whole text, never null.
   [[nodiscard]] const NDString& text() const noexcept { return text_; }
-  /// The part before the first colon; null without a colon.
+  /// The part before the first colon; null without a colon, or when a "/", "?" or "#" precedes it.
   [[nodiscard]] NDString scheme() const;
-  /// "/" followed by the path's components without their slashes; empty without a path.
+  /// "/" for a path that begins with one, then the path's components without their slashes, none
+  /// of them empty; empty without a path. The path ends before the first "?" or "#".
   [[nodiscard]] std::vector<NDString> pathComponents() const;
-  /// What follows the first "?" up to a "#"; null without a "?".
+  /// What follows the first "?" up to a "#"; null without a "?" before the first "#".
   [[nodiscard]] NDString query() const;
 
   /// For the factories alone.

@@ -63,6 +63,8 @@ class ND_EXPORT NDValue {
   explicit NDValue(Content content) : content_(std::move(content)) {}
 
  private:
+  [[nodiscard]] std::partial_ordering compareWith(const NDValue& other) const noexcept;
+
   Content content_;
 };
 

@@ -1,0 +1,85 @@
+#include "PlatformModel/Assistant/VAHAFilter.h"
+
+#include "PlatformModel/Assistant/VAHAConstants.h"
+
+namespace nidus {
+namespace {
+
+/// Collects the fields of a filter on one line: `NAME {homeName: "Cabin", roomName: "Hall"}`.
+class FilterText {
+ public:
+  explicit FilterText(std::string_view className) : text_(className) { text_ += " {"; }
+
+  void add(std::string_view field, const NDString& value) {
+    if (!value) return;
+    separate();
+    text_.append(field).append(": ");
+    addQuoted(value.view());
+  }
+
+  void add(const NDURLRef& identifier) {
+    separate();
+    addQuoted(identifier->text().view());
+  }
+
+  [[nodiscard]] std::string finish() { return std::move(text_) + '}'; }
+
+ private:
+  void separate() {
+    if (!text_.ends_with('{')) text_ += ", ";
+  }
+
+  void addQuoted(std::string_view value) {
+    text_ += '"';
+    for (const char c : value) addEscaped(c);
+    text_ += '"';
+  }
+
+  // A line break in a name must not break the line.
+  void addEscaped(char c) {
+    if (c == '\n') {
+      text_ += "\\n";
+    } else if (c == '\r') {
+      text_ += "\\r";
+    } else {
+      if (c == '"' || c == '\\') text_ += '\\';
+      text_ += c;
+    }
+  }
+
+  std::string text_;
+};
+
+}  // namespace
+
+VAHAFilter::~VAHAFilter() = default;
+
+std::string_view VAHASearchCriteriaFilter::encodedClassName() const {
+  return VAHASearchCriteriaFilterClassIdentifier;
+}
+
+std::string VAHASearchCriteriaFilter::description() const {
+  FilterText text(encodedClassName());
+  text.add("homeName", homeName_);
+  text.add("entityType", entityType_);
+  text.add("attribute", attribute_);
+  text.add("serviceType", serviceType_);
+  text.add("roomName", roomName_);
+  text.add("zoneName", zoneName_);
+  text.add("groupName", groupName_);
+  text.add("serviceName", serviceName_);
+  text.add("sceneName", sceneName_);
+  return text.finish();
+}
+
+std::string_view VAHAIdentifierFilter::encodedClassName() const {
+  return VAHAIdentifierFilterClassIdentifier;
+}
+
+std::string VAHAIdentifierFilter::description() const {
+  FilterText text(encodedClassName());
+  for (const NDURLRef& identifier : identifiers_) text.add(identifier);
+  return text.finish();
+}
+
+}  // namespace nidus

@@ -1,0 +1,24 @@
+#include "PlatformModel/Home/NDHomeManager.h"
+
+#include "PlatformModel/NDPlatform.h"
+
+namespace nidus {
+
+NDHomeManagerDelegate::~NDHomeManagerDelegate() = default;
+
+void NDHomeManagerDelegate::homeManagerWillNotUpdateHomes(
+    const std::shared_ptr<NDHomeManager>& /*manager*/) {}
+
+NDHomeManager::~NDHomeManager() = default;
+
+std::shared_ptr<NDHomeManager> NDHomeManager::create() {
+  const auto platform = NDPlatform::registered();
+  return platform ? platform->createHomeManager() : nullptr;
+}
+
+NDString getHomeConfigurationPath() {
+  const auto platform = NDPlatform::registered();
+  return platform ? platform->homeConfigurationPath() : NDString();
+}
+
+}  // namespace nidus

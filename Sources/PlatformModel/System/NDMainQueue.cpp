@@ -1,0 +1,71 @@
+#include "PlatformModel/System/NDMainQueue.h"
+
+#include <utility>
+
+namespace nidus {
+
+void NDMainQueue::async(NDTask task) {
+  std::function<void()> wakeHandler;
+  {
+    const NDLock lock(mutex_);
+    if (tasks_.empty()) wakeHandler = wakeHandler_;
+    tasks_.push_back(std::move(task));
+    changed_.notify_all();
+  }
+  if (wakeHandler) wakeHandler();
+}
+
+bool NDMainQueue::runOne() {
+  NDTask task;
+  if (!take(task)) return false;
+  task();
+  return true;
+}
+
+std::size_t NDMainQueue::drain() {
+  std::size_t ran = 0;
+  while (runOne()) ++ran;
+  return ran;
+}
+
+void NDMainQueue::runUntil(const std::function<bool()>& isDone) {
+  for (;;) {
+    const std::size_t wakesSeen = wakes();
+    if (isDone()) return;
+    if (!runOne()) waitForWorkOrWake(wakesSeen);
+  }
+}
+
+void NDMainQueue::wake() {
+  const NDLock lock(mutex_);
+  ++wakes_;
+  changed_.notify_all();
+}
+
+void NDMainQueue::setWakeHandler(std::function<void()> handler) {
+  {
+    const NDLock lock(mutex_);
+    wakeHandler_.swap(handler);
+  }
+  // The earlier handler is destroyed here, without the lock.
+}
+
+bool NDMainQueue::take(NDTask& task) {
+  const NDLock lock(mutex_);
+  if (tasks_.empty()) return false;
+  task = std::move(tasks_.front());
+  tasks_.pop_front();
+  return true;
+}
+
+std::size_t NDMainQueue::wakes() {
+  const NDLock lock(mutex_);
+  return wakes_;
+}
+
+void NDMainQueue::waitForWorkOrWake(std::size_t wakesSeen) {
+  NDLock lock(mutex_);
+  while (tasks_.empty() && wakes_ == wakesSeen) changed_.wait(lock.native());
+}
+
+}  // namespace nidus
