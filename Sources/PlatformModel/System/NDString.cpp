@@ -28,9 +28,8 @@ struct NDString::Text {
     if (!text) return;
     // Whoever releases last must see all that the other owners did with the characters.
     if (text->references.fetch_sub(1, std::memory_order_acq_rel) != 1) return;
-    const std::size_t blockSize = sizeof(Text) + text->length;
     text->~Text();
-    ::operator delete(text, blockSize);
+    ::operator delete(text);
   }
 
   std::atomic<std::size_t> references{1};

@@ -16,6 +16,11 @@ namespace nidus {
 /// `isEqualIgnoringDiacritics` says so. May be called from any thread.
 [[nodiscard]] ND_EXPORT std::string foldDiacritics(std::string_view text);
 
+/// Gives what is compared when diacritics are ignored: the code points of the canonical
+/// decomposition of a UTF-8 text, without the nonspacing marks. A byte that is not UTF-8 becomes
+/// 0x110000 plus its value. May be called from any thread.
+[[nodiscard]] ND_EXPORT std::u32string withoutDiacritics(std::string_view text);
+
 /// Says whether `text` contains `part` when the case of ASCII letters is ignored. The empty part
 /// is contained in every text. May be called from any thread.
 [[nodiscard]] ND_EXPORT bool containsIgnoringCase(std::string_view text, std::string_view part);
