@@ -21,9 +21,9 @@ namespace nidus {
 ///     if (replies && replies->empty()) say("no reply");
 class CommandRunner {
  public:
-  /// `mainQueue`, never null, is drained while the runner waits. `drain` is for a platform that does
-  /// all its work on the thread that drains: it is called instead, once for each wait; empty for a
-  /// platform with threads of its own.
+  /// `mainQueue`, never null, is drained while the runner waits. `drain` is for a platform that
+  /// does all its work on the thread that drains: it is called instead, once for each wait; empty
+  /// for a platform with threads of its own.
   CommandRunner(const NDAssistantModule& module, std::shared_ptr<NDMainQueue> mainQueue,
                 std::function<void()> drain = {});
 

@@ -7,7 +7,8 @@ namespace nidus {
 namespace {
 
 Failure inputFailure(const std::string& name, const std::string& reason) {
-  return {Failure::Kind::badInput, name + ": cannot be read (" + reason + "); name a readable file"};
+  return {Failure::Kind::badInput,
+          name + ": cannot be read (" + reason + "); name a readable file"};
 }
 
 }  // namespace

@@ -28,8 +28,8 @@ struct SyncChange {
 ///     (*client)->end();
 class SyncClient {
  public:
-  /// Makes a client with a sync handler of its own; never null. Fails, as the platform's fault, when
-  /// the module makes no handler.
+  /// Makes a client with a sync handler of its own; never null. Fails, as the platform's fault,
+  /// when the module makes no handler.
   [[nodiscard]] static Result<std::shared_ptr<SyncClient>> make(const NDAssistantModule& module);
 
   /// Begins a sync and blocks until the plug-in has its data, for about two seconds at most.
