@@ -56,17 +56,20 @@ class ObjectsByRoom {
  public:
   explicit ObjectsByRoom(const ObjectList& objects) {
     for (const HomeObjectRecord* object : objects) {
-      if (object->objectRoom) byRoom_[foldDiacritics(object->objectRoom.view())].push_back(object);
+      if (object->objectRoom) inRoom(object->objectRoom).push_back(object);
     }
   }
 
-  void appendTo(ObjectList& list, const NDString& roomName) const {
-    const auto found = byRoom_.find(foldDiacritics(roomName.view()));
-    if (found != byRoom_.end()) append(list, found->second);
+  /// The records in rooms of that name, diacritics ignored.
+  [[nodiscard]] ObjectList& inRoom(const NDString& roomName) {
+    ObjectList*& objects = bySpelling_[roomName];
+    if (!objects) objects = &byName_[withoutDiacritics(roomName.view())];
+    return *objects;
   }
 
  private:
-  std::unordered_map<std::string, ObjectList> byRoom_;
+  std::unordered_map<std::u32string, ObjectList> byName_;
+  std::unordered_map<NDString, ObjectList*> bySpelling_;
 };
 
 /// One search: narrows the snapshot field by field of the filter. A step runs only while there is
@@ -236,10 +239,10 @@ std::optional<ObjectList> NDAssistantCommand::objectsWithSearchFilter_inHome(
 ObjectList NDAssistantCommand::filterObjects_forRoom_andZone(const ObjectList& objects,
                                                              const NDString& roomName,
                                                              const NDString& zoneName) const {
-  const ObjectsByRoom objectsByRoom(objects);
+  ObjectsByRoom objectsByRoom(objects);
   ObjectList kept;
   for (const HomeObjectRecord& object : nidusObjects_) {
-    if (isRoom(object, roomName, zoneName)) objectsByRoom.appendTo(kept, object.objectName);
+    if (isRoom(object, roomName, zoneName)) append(kept, objectsByRoom.inRoom(object.objectName));
   }
   return kept;
 }

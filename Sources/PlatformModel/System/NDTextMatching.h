@@ -12,10 +12,6 @@ namespace nidus {
 /// only themselves. May be called from any thread; allocates nothing when both texts are ASCII.
 [[nodiscard]] ND_EXPORT bool isEqualIgnoringDiacritics(std::string_view a, std::string_view b);
 
-/// Gives `text` without its diacritics, for tables: two texts have the same key exactly when
-/// `isEqualIgnoringDiacritics` says so. May be called from any thread.
-[[nodiscard]] ND_EXPORT std::string foldDiacritics(std::string_view text);
-
 /// Gives what is compared when diacritics are ignored: the code points of the canonical
 /// decomposition of a UTF-8 text, without the nonspacing marks. A byte that is not UTF-8 becomes
 /// 0x110000 plus its value. May be called from any thread.
