@@ -102,8 +102,8 @@ class CheckingHandler {
   }
   /// The parser's own value is a 64-bit float, and rounding twice may miss the nearest one: the
   /// text decides.
-  bool number_float(number_float_t,
-                    const string_t& text) {  // NOLINT(readability-identifier-naming)
+  // NOLINTNEXTLINE(readability-identifier-naming)
+  bool number_float(number_float_t roughly, const string_t& text) {
     if (isInteger(text)) failBeyondRange(true);
     std::string number = text;
     std::replace(number.begin(), number.end(), ',', '.');  // the parser writes the locale's point
