@@ -1,0 +1,105 @@
+#include "nidus/CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <csignal>
+#include <memory>
+#include <utility>
+#include <vector>
+
+#include "nidus/CommandSyntax.h"
+#include "nidus/Commands/Commands.h"
+#include "nidus/Settings.h"
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+namespace {
+
+/// Declares a command to the parser of arguments.
+class ParserSyntax final : public CommandSyntax {
+ public:
+  /// `chosen` takes what runs the command that was given.
+  ParserSyntax(CLI::App& app, std::function<ExitStatus()>& chosen) : app_(app), chosen_(chosen) {
+    app_.set_help_flag("-h,--help", "Print this help and exit");
+  }
+
+  CommandSyntax& command(const std::string& name, const std::string& help,
+                         const std::string& details) override {
+    CLI::App* below = app_.add_subcommand(name, help);
+    below->fallthrough();
+    below->footer(details);
+    app_.require_subcommand(1);
+    below_.push_back(std::make_unique<ParserSyntax>(*below, chosen_));
+    return *below_.back();
+  }
+  void flag(const std::string& name, bool& target, const std::string& help) override {
+    app_.add_flag(name, target, help);
+  }
+  void option(const std::string& name, const std::string& value, std::string& target,
+              const std::string& help) override {
+    app_.add_option(name, target, help)->option_text(value);
+  }
+  void argument(const std::string& name, std::string& target, const std::string& help) override {
+    app_.add_option(name, target, help)->option_text(" ");
+  }
+  void requiredArgument(const std::string& name, std::string& target,
+                        const std::string& help) override {
+    app_.add_option(name, target, help)->option_text(" ")->required();
+  }
+  void run(std::function<ExitStatus()> action) override {
+    app_.callback([this, action = std::move(action)] { chosen_ = action; });
+  }
+
+ private:
+  CLI::App& app_;
+  std::function<ExitStatus()>& chosen_;
+  std::vector<std::unique_ptr<ParserSyntax>> below_;
+};
+
+void declareProgram(CommandSyntax& program, Settings& settings) {
+  program.option("--data", "DIR", settings.dataFolder,
+                 "The folder of the homes and preferences (else NIDUS_DATA, else nidus in the "
+                 "user's data folder)");
+  program.flag("--locked", settings.isLocked, "The device is locked");
+  declareHome(program, settings);
+  declarePerform(program, settings);
+  declareSync(program, settings);
+  declareRecords(program, settings);
+  declareReplay(program);
+  declareDemo(program);
+}
+
+ExitStatus reportUsage(const CLI::App& app, const CLI::ParseError& error) {
+  return report(
+      {Failure::Kind::badInput, std::string(error.what()) + "; see " + app.get_name() + " --help"});
+}
+
+ExitStatus parseAndRun(CLI::App& app, int argc, const char* const* argv,
+                       const std::function<ExitStatus()>& chosen) {
+  try {
+    app.parse(argc, argv);
+  } catch (const CLI::CallForHelp&) {
+    return printText(app.help());
+  } catch (const CLI::CallForVersion& version) {
+    return printText(std::string(version.what()) + '\n');
+  } catch (const CLI::ParseError& error) {
+    return reportUsage(app, error);
+  }
+  return chosen();
+}
+
+}  // namespace
+
+int runCommandLine(int argc, const char* const* argv) {
+  // A reader that has gone is an error of the write that meets it, not the end of the process.
+  std::signal(SIGPIPE, SIG_IGN);
+  CLI::App app("Lets an assistant's commands act on a home.", "nidus");
+  app.set_version_flag("--version", "nidus " NIDUS_VERSION);
+  app.footer("Each command has a help of its own: nidus COMMAND --help");
+  Settings settings;
+  std::function<ExitStatus()> chosen;
+  ParserSyntax program(app, chosen);
+  declareProgram(program, settings);
+  return static_cast<int>(parseAndRun(app, argc, argv, chosen));
+}
+
+}  // namespace nidus

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <functional>
+#include <string>
+
+#include "nidus/ExitStatus.h"
+
+namespace nidus {
+
+/// Takes the declaration of one command: its options, its arguments, the commands below it, and
+/// what runs it. Each command's own unit declares it, and alone knows its options.
+///
+/// What is declared with a target must keep the target alive through the function given to `run`.
+///
+///     auto file = std::make_shared<std::string>("-");
+///     CommandSyntax& perform = program.command("perform", "Performs commands", "");
+///     perform.argument("FILE", *file, "The commands");
+///     perform.run([file] { return performFile(*file); });
+class CommandSyntax {
+ public:
+  virtual ~CommandSyntax() = default;
+
+  /// Adds a command below this one. `help` is one line, `details` (may be empty) follow the options
+  /// in the command's own help. Valid as long as this one.
+  virtual CommandSyntax& command(const std::string& name, const std::string& help,
+                                 const std::string& details) = 0;
+  /// Adds an option without a value, such as "--merge", that sets `target`.
+  virtual void flag(const std::string& name, bool& target, const std::string& help) = 0;
+  /// Adds an option with a value, such as "--data"; `value` names it in the help.
+  virtual void option(const std::string& name, const std::string& value, std::string& target,
+                      const std::string& help) = 0;
+  /// Adds an argument that may be left out, and one that must be there.
+  virtual void argument(const std::string& name, std::string& target, const std::string& help) = 0;
+  virtual void requiredArgument(const std::string& name, std::string& target,
+                                const std::string& help) = 0;
+  /// Sets what runs when this command is the one that was given.
+  virtual void run(std::function<ExitStatus()> action) = 0;
+};
+
+}  // namespace nidus

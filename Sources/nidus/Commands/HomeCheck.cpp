@@ -1,0 +1,27 @@
+#include <memory>
+
+#include "nidus/CommandSyntax.h"
+#include "nidus/Commands/Commands.h"
+#include "nidus/Commands/HomeInput.h"
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+namespace {
+
+ExitStatus checkHomes(const std::string& file) {
+  const auto homes = readHomes(file);
+  if (!homes) return report(homes.failure());
+  return printText(onOneLine(file) + ": " + sizeOf(*homes) + '\n');
+}
+
+}  // namespace
+
+void declareHomeCheck(CommandSyntax& home) {
+  const auto file = std::make_shared<std::string>();
+  CommandSyntax& syntax = home.command("check", "Checks a home document and changes nothing",
+                                       "Says what is wrong and where, as a JSON pointer.");
+  syntax.requiredArgument("FILE", *file, "A home document; - reads standard input");
+  syntax.run([file] { return checkHomes(*file); });
+}
+
+}  // namespace nidus

@@ -1,0 +1,42 @@
+#include <memory>
+
+#include "nidus/CommandSyntax.h"
+#include "nidus/Commands/Commands.h"
+#include "nidus/Commands/HomeInput.h"
+#include "nidus/Session.h"
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+namespace {
+
+struct ImportOptions {
+  std::string file;
+  bool merges = false;
+};
+
+ExitStatus importHomes(const ImportOptions& options, const Settings& settings) {
+  const auto homes = readHomes(options.file);
+  if (!homes) return report(homes.failure());
+  const auto registered = openPlatform(settings);
+  if (!registered) return report(registered.failure());
+  if (auto failure = (*registered)->platform()->importHomes(*homes, options.merges)) {
+    return report(*failure);
+  }
+  return printText("imported " + sizeOf(*homes) + '\n');
+}
+
+}  // namespace
+
+void declareHomeImport(CommandSyntax& home, const Settings& settings) {
+  const auto options = std::make_shared<ImportOptions>();
+  CommandSyntax& syntax =
+      home.command("import", "Puts the homes of a document in place of all homes",
+                   "The document is checked whole before anything is changed. Try it first with "
+                   "nidus home check FILE.");
+  syntax.requiredArgument("FILE", options->file, "A home document; - reads standard input");
+  syntax.flag("--merge", options->merges,
+              "Replace only the homes of the same UUID and keep the others");
+  syntax.run([options, &settings] { return importHomes(*options, settings); });
+}
+
+}  // namespace nidus

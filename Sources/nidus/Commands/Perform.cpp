@@ -1,0 +1,117 @@
+#include <algorithm>
+#include <cstddef>
+#include <iostream>
+#include <memory>
+#include <sstream>
+
+#include "AssistantHost/CommandReader.h"
+#include "AssistantHost/InputFile.h"
+#include "AssistantHost/JsonLine.h"
+#include "nidus/CommandSyntax.h"
+#include "nidus/Commands/CommandText.h"
+#include "nidus/Commands/Commands.h"
+#include "nidus/Outcome.h"
+#include "nidus/Session.h"
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+namespace {
+
+constexpr const char kStandardInput[] = "standard input";
+
+/// Performs commands one after the other and keeps the worst of their statuses.
+class Performance {
+ public:
+  explicit Performance(CommandRunner& runner) : runner_(runner) {}
+
+  /// Reads and performs the command in `text`, and prints its replies; `name` stands for the text
+  /// in messages.
+  void perform(std::string_view text, const std::string& name) {
+    status_ = std::max(status_.value_or(ExitStatus::success), performOne(text, name));
+  }
+
+  /// Performs the command of each line of `in` that is not blank, before the next line is read.
+  void performLines(std::istream& in, const std::string& name) {
+    std::string line;
+    for (std::size_t number = 1; canGoOn() && std::getline(in, line); ++number) {
+      if (!isBlank(line)) perform(line, name + ": line " + std::to_string(number));
+    }
+    if (in.bad()) {
+      status_ = report({Failure::Kind::platform, name + ": reading failed; try again"});
+    } else if (!status_) {
+      status_ =
+          report({Failure::Kind::badInput, name + ": there is no command; give at least one"});
+    }
+  }
+
+  /// Once something was performed.
+  [[nodiscard]] ExitStatus status() const { return status_.value_or(ExitStatus::success); }
+
+ private:
+  /// A platform that has failed or an output that nobody takes fails the following commands too.
+  [[nodiscard]] bool canGoOn() const { return status_ != ExitStatus::platformFailed; }
+
+  ExitStatus performOne(std::string_view text, const std::string& name) {
+    const auto command = readCommand(text, name);
+    if (!command) return report(command.failure());
+    const auto replies = runner_.perform(**command);
+    if (!replies) return report(replies.failure());
+    if (replies->empty()) {
+      reportLine(name + ": the plug-in gave no reply; see what is there with nidus records");
+    }
+    for (const NDDictionary& reply : *replies) {
+      if (auto failure = writeOutput(jsonLine(reply))) return report(*failure);
+    }
+    return statusOf(*replies);
+  }
+
+  CommandRunner& runner_;
+  std::optional<ExitStatus> status_;
+};
+
+ExitStatus performInput(const Settings& settings) {
+  const auto session = Session::open(settings);
+  if (!session) return report(session.failure());
+  Performance performance((*session)->runner());
+  performance.performLines(std::cin, kStandardInput);
+  return performance.status();
+}
+
+ExitStatus performFile(const std::string& file, const Settings& settings) {
+  auto in = openInput(file);
+  if (!in) return report(in.failure());
+  const auto text = readAll(*in, file);
+  if (!text) return report(text.failure());
+  const auto session = Session::open(settings);
+  if (!session) return report(session.failure());
+  Performance performance((*session)->runner());
+  if (isOneDocument(*text)) {
+    performance.perform(*text, file);
+  } else {
+    std::istringstream lines(*text);
+    performance.performLines(lines, file);
+  }
+  return performance.status();
+}
+
+}  // namespace
+
+void declarePerform(CommandSyntax& program, const Settings& settings) {
+  const auto file = std::make_shared<std::string>("-");
+  CommandSyntax& syntax = program.command(
+      "perform", "Performs commands and prints the replies",
+      "Commands are JSON, one a line; a file may also be one command over several lines. Each "
+      "reply\n"
+      "is one line. Lines of standard input are answered before the next one is read.\n\n"
+      "Example: which lights of the kitchen are on?\n"
+      "  {\"filter\": {\"search\": {\"roomName\": \"Kitchen\", \"serviceType\": \"LIGHT\"}},\n"
+      "   \"actions\": [{\"actionType\": \"GET\", \"attribute\": \"POWER\"}]}\n\n"
+      "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform\n"
+      "failed; the highest of all commands.");
+  syntax.argument("FILE", *file, "The commands; standard input when it is left out or -");
+  syntax.run([file, &settings] {
+    return *file == "-" ? performInput(settings) : performFile(*file, settings);
+  });
+}
+
+}  // namespace nidus

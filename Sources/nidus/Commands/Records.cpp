@@ -1,0 +1,32 @@
+#include "HomePlatform/Json/JsonText.h"
+#include "nidus/CommandSyntax.h"
+#include "nidus/Commands/Commands.h"
+#include "nidus/Session.h"
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+namespace {
+
+ExitStatus printRecords(const Settings& settings) {
+  const auto session = Session::open(settings);
+  if (!session) return report(session.failure());
+  const auto records = (*session)->runner().records();
+  if (!records) return report(records.failure());
+  std::string lines;
+  for (const NDDictionaryValue& record : *records) {
+    appendJson(lines, record);
+    lines += '\n';
+  }
+  return printText(lines);
+}
+
+}  // namespace
+
+void declareRecords(CommandSyntax& program, const Settings& settings) {
+  CommandSyntax& syntax =
+      program.command("records", "Prints the objects that a filter is resolved against",
+                      "JSON lines, one record a line, in the order of the home.");
+  syntax.run([&settings] { return printRecords(settings); });
+}
+
+}  // namespace nidus

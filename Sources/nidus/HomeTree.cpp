@@ -1,0 +1,169 @@
+#include "nidus/HomeTree.h"
+
+#include <algorithm>
+#include <cstddef>
+#include <utility>
+#include <vector>
+
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+namespace {
+
+struct Branch {
+  std::string text;
+  std::vector<Branch> below;
+};
+
+void draw(const std::vector<Branch>& branches, const std::string& margin, std::string& out) {
+  for (const Branch& branch : branches) {
+    const bool isLast = &branch == &branches.back();
+    out += margin + (isLast ? "└─ " : "├─ ") + onOneLine(branch.text) + '\n';
+    draw(branch.below, margin + (isLast ? "   " : "│  "), out);
+  }
+}
+
+std::string joined(const std::vector<std::string>& parts) {
+  std::string text;
+  for (const std::string& part : parts) text += (text.empty() ? "" : ", ") + part;
+  return text;
+}
+
+template <class Object>
+std::string namesOf(const std::vector<Object>& objects) {
+  std::vector<std::string> names;
+  for (const Object& object : objects) names.push_back(object.name.str());
+  return joined(names);
+}
+
+std::string symbolOf(const NDString& unit) {
+  struct Symbol {
+    const char* unit;
+    const char* text;
+  };
+  constexpr Symbol kSymbols[] = {
+      {"percentage", " %"}, {"celsius", " °C"}, {"fahrenheit", " °F"}, {"arcdegrees", "°"}};
+  if (!unit) return {};
+  for (const Symbol& symbol : kSymbols) {
+    if (unit == symbol.unit) return symbol.text;
+  }
+  return ' ' + unit.str();
+}
+
+/// The attribute that commands use for a characteristic; what is only written is its target.
+std::string attributeOf(const NDString& type, const NDNAPMetadata& metadata) {
+  const NDString name = metadata.mapToAssistantCharacteristicName(type);
+  if (!name) return type.str();
+  const NDString readType = metadata.mapReadCharcteristicFromAssistantName(name);
+  return !readType || readType == type ? name.str() : name.str() + " target";
+}
+
+std::string valueOf(const CharacteristicData& data, const NDNAPMetadata& metadata) {
+  if (!data.value) return "unknown";
+  const NDString& type = data.characteristicType;
+  const NDValueRef value = metadata.mapToAssistantCharacteristicValue_name(data.value, type);
+  if (value->isBoolean()) return value->boolValue() ? "true" : "false";
+  const bool hasUnit = data.metadata && data.metadata->units;
+  const NDString unit = hasUnit ? data.metadata->units : metadata.characteristicValueUnit(type);
+  return value->description() + (value->isNumber() ? symbolOf(unit) : "");
+}
+
+std::string typeOf(const NDString& type, const NDNAPMetadata& metadata) {
+  const NDString name = metadata.mapToAssistantServiceName(type);
+  return name ? name.str() : type.str();
+}
+
+Branch serviceBranch(const ServiceData& service, const NDNAPMetadata& metadata) {
+  std::string text = (service.name ? service.name.str() : "(no name)") + " [" +
+                     typeOf(service.serviceType, metadata);
+  if (service.associatedServiceType) {
+    text += " as " + typeOf(service.associatedServiceType, metadata);
+  }
+  std::vector<std::string> values;
+  for (const CharacteristicData& characteristic : service.characteristics) {
+    values.push_back(attributeOf(characteristic.characteristicType, metadata) + ' ' +
+                     valueOf(characteristic, metadata));
+  }
+  return {text + (values.empty() ? "]" : "] " + joined(values)), {}};
+}
+
+Branch accessoryBranch(const AccessoryData& accessory, const NDNAPMetadata& metadata) {
+  std::vector<std::string> notes;
+  if (!accessory.reachable) notes.emplace_back("unreachable");
+  if (accessory.requiresUnlock) notes.emplace_back("requires an unlocked device");
+  Branch branch{accessory.name.str() + (notes.empty() ? "" : " (" + joined(notes) + ')'), {}};
+  for (const ServiceData& service : accessory.services) {
+    branch.below.push_back(serviceBranch(service, metadata));
+  }
+  return branch;
+}
+
+/// The accessories that stand in `room`, or in no room for none.
+Branch roomBranch(const std::string& name, const std::optional<NDUUID>& room, const HomeData& home,
+                  const NDNAPMetadata& metadata) {
+  Branch branch{name, {}};
+  for (const AccessoryData& accessory : home.accessories) {
+    if (accessory.room == room) branch.below.push_back(accessoryBranch(accessory, metadata));
+  }
+  return branch;
+}
+
+std::string zoneText(const ZoneData& zone, const HomeData& home) {
+  std::vector<std::string> rooms;
+  for (const RoomData& room : home.rooms) {
+    if (std::count(zone.rooms.begin(), zone.rooms.end(), room.uuid) > 0) {
+      rooms.push_back(room.name.str());
+    }
+  }
+  return zone.name.str() + ": " + (rooms.empty() ? "no rooms" : joined(rooms));
+}
+
+/// The name of the service at `address`, or that of its accessory when it has none.
+std::string serviceName(const ServiceAddress& address, const HomeData& home) {
+  for (const AccessoryData& accessory : home.accessories) {
+    if (accessory.uuid != address.accessory) continue;
+    for (const ServiceData& service : accessory.services) {
+      if (service.instanceID == address.service && service.name) return service.name.str();
+    }
+    return accessory.name.str();
+  }
+  return {};
+}
+
+std::string groupText(const ServiceGroupData& group, const HomeData& home) {
+  std::vector<std::string> services;
+  for (const ServiceAddress& address : group.services) {
+    services.push_back(serviceName(address, home));
+  }
+  return group.name.str() + ": " + (services.empty() ? "no services" : joined(services));
+}
+
+template <class Object>
+void addList(std::vector<Branch>& branches, const std::string& title,
+             const std::vector<Object>& objects,
+             std::string (*describe)(const Object&, const HomeData&), const HomeData& home) {
+  if (objects.empty()) return;
+  Branch list{title, {}};
+  for (const Object& object : objects) list.below.push_back({describe(object, home), {}});
+  branches.push_back(std::move(list));
+}
+
+}  // namespace
+
+std::string homeTree(const HomeData& home, const NDNAPMetadata& metadata) {
+  std::vector<Branch> branches;
+  for (const RoomData& room : home.rooms) {
+    branches.push_back(roomBranch(room.name.str(), room.uuid, home, metadata));
+  }
+  Branch roomless = roomBranch("in no room", std::nullopt, home, metadata);
+  if (!roomless.below.empty()) branches.push_back(std::move(roomless));
+  addList(branches, "zones", home.zones, zoneText, home);
+  addList(branches, "groups", home.serviceGroups, groupText, home);
+  if (!home.actionSets.empty()) branches.push_back({"scenes: " + namesOf(home.actionSets), {}});
+  if (!home.triggers.empty()) branches.push_back({"triggers: " + namesOf(home.triggers), {}});
+  std::string text = onOneLine(home.name.view()) + (home.primary ? " (primary)" : "") + '\n';
+  draw(branches, "", text);
+  return text;
+}
+
+}  // namespace nidus

@@ -1,0 +1,27 @@
+#pragma once
+
+#include <filesystem>
+#include <utility>
+
+#include "HomePlatform/Result.h"
+
+namespace nidus {
+
+/// A folder of one's own for a while; removed with all that is in it when this is destroyed.
+class TemporaryFolder {
+ public:
+  /// Makes one in the folder for temporary files (TMPDIR, else /tmp).
+  [[nodiscard]] static Result<TemporaryFolder> make();
+  TemporaryFolder(TemporaryFolder&& other) noexcept : path_(std::exchange(other.path_, {})) {}
+  TemporaryFolder& operator=(TemporaryFolder&&) = delete;
+  ~TemporaryFolder();
+
+  [[nodiscard]] const std::filesystem::path& path() const noexcept { return path_; }
+
+ private:
+  explicit TemporaryFolder(std::filesystem::path path) : path_(std::move(path)) {}
+
+  std::filesystem::path path_;
+};
+
+}  // namespace nidus
