@@ -152,7 +152,7 @@ class NDAssistantCommand : public VAHACommand,
   void handleUpdateActionTypes_serviceType_forObjects_completionHandler(
       const VAHAActionRef& action, const NDString& serviceType, const ObjectList& objects,
       const VAHAReplyHandler& handler);
-  /// The value that `action` makes of the current value of `characteristic` (never null): the
+  /// The value that `action` makes of the current value of `characteristic`, neither null: the
   /// opposite boolean, or the sum in the characteristic's own units, kept within its limits. The
   /// slot `outcome` (never null) is for an override that refuses: what it puts there becomes the
   /// outcome, and nothing is written. This one never touches it. Reports nothing.
