@@ -4,23 +4,14 @@
 #include <memory>
 #include <string>
 #include <string_view>
-#include <unordered_set>
 #include <vector>
 
 #include "HomePlatform/Json/JsonObject.h"
 #include "HomePlatform/Json/JsonPath.h"
 #include "HomePlatform/Store/HomeData.h"
+#include "HomePlatform/Store/SharedTexts.h"
 
 namespace nidus {
-
-/// Keeps one copy of each text that many objects share, such as types and units.
-class SharedTexts {
- public:
-  [[nodiscard]] NDString text(const std::string& text) { return *texts_.emplace(text).first; }
-
- private:
-  std::unordered_set<NDString> texts_;
-};
 
 /// Reads one object of a home document. The objects of its lists are read before it ends, each by a
 /// reader of its own, so that the document never stands in memory as a tree.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstdint>
 #include <filesystem>
 #include <memory>
@@ -26,12 +27,19 @@ struct ValueChange {
 /// on disk when the call returns. A failure's message names the file and the remedy.
 class HomeStore {
  public:
-  /// Opens the database in `file`, making or migrating it as needed; none opens one in memory.
+  /// How long a call waits for another process that is changing the database.
+  static constexpr std::chrono::milliseconds kLockTimeout{10'000};
+
+  /// Opens the database in `file`; none opens one in memory. Folder and file are made, for their
+  /// owner alone, when they are missing, and an earlier schema is migrated. Fails when the file is
+  /// damaged, locked for longer than `lockTimeout`, not to be written, from a newer version of the
+  /// program or no database of ours; it is left as it was.
   [[nodiscard]] static Result<std::unique_ptr<HomeStore>> open(
-      const std::optional<std::filesystem::path>& file);
+      const std::optional<std::filesystem::path>& file,
+      std::chrono::milliseconds lockTimeout = kLockTimeout);
   virtual ~HomeStore() = default;
 
-  /// Replaces all homes.
+  /// Replaces all homes. `homes` hold what a home document may hold.
   [[nodiscard]] virtual Status replaceHomes(const std::vector<HomeData>& homes) = 0;
   /// Replaces the homes of the same UUID in their places and adds the others at the end.
   [[nodiscard]] virtual Status mergeHomes(const std::vector<HomeData>& homes) = 0;

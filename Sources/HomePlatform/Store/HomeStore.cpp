@@ -1,0 +1,206 @@
+#include "HomePlatform/Store/HomeStore.h"
+
+#include <string>
+
+#include "HomePlatform/Store/Database.h"
+#include "HomePlatform/Store/DatabaseFile.h"
+#include "HomePlatform/Store/HomeInserter.h"
+#include "HomePlatform/Store/HomeLoader.h"
+#include "HomePlatform/Store/Schema.h"
+#include "PlatformModel/System/NDMutex.h"
+
+namespace nidus {
+namespace {
+
+Failure failure(const std::string& name, const std::string& problem, const std::string& remedy) {
+  return {Failure::Kind::platform, name + ": " + problem + "; " + remedy};
+}
+
+Failure failureOf(const DatabaseError& error, const std::string& name) {
+  const std::string cause = " (" + error.message + ")";
+  switch (error.kind) {
+    case DatabaseError::Kind::locked:
+      return failure(name, "the database is locked: another process is using it" + cause,
+                     "try again when that one has finished");
+    case DatabaseError::Kind::damaged:
+      return failure(name, "the database is damaged" + cause,
+                     "restore it from a backup, or move it away and import the homes again");
+    case DatabaseError::Kind::notADatabase:
+      return failure(name, "the file is damaged or no database" + cause,
+                     "restore it from a backup, or move it away and import the homes again");
+    case DatabaseError::Kind::notWritable:
+      return failure(name, "the database cannot be opened for writing" + cause,
+                     "give yourself write permission on the file and its folder");
+    case DatabaseError::Kind::full:
+      return failure(name, "the disk is full" + cause, "make room on it and try again");
+    case DatabaseError::Kind::other:
+      break;
+  }
+  return failure(name, "the database failed" + cause, "check the disk and try again");
+}
+
+Failure failureOf(SchemaProblem problem, const std::string& name) {
+  if (problem == SchemaProblem::newer) {
+    return failure(name, "the database was written by a newer version of this program",
+                   "use that version, or another data folder");
+  }
+  return failure(name, "the file is a database of another program", "use another data folder");
+}
+
+/// The store over one connection. Every operation is a transaction under the lock.
+class SqliteHomeStore final : public HomeStore {
+ public:
+  SqliteHomeStore(const std::string& path, std::string name, std::chrono::milliseconds lockTimeout)
+      : name_(std::move(name)), database_(path, lockTimeout) {}
+
+  /// Makes the database ready for use.
+  [[nodiscard]] Status prepare(bool isFile) {
+    NDLock lock(mutex_);
+    if (const auto problem = applySchema(database_, schemaSteps())) {
+      return failureOf(*problem, name_);
+    }
+    if (isFile) database_.useWriteAheadLog();
+    return std::nullopt;
+  }
+
+  Status replaceHomes(const std::vector<HomeData>& homes) override {
+    return change([&homes](Database& database) {
+      database.run("DELETE FROM home");
+      HomeInserter inserter(database);
+      std::int64_t position = 0;
+      for (const HomeData& home : homes) inserter.insert(home, position++);
+    });
+  }
+
+  Status mergeHomes(const std::vector<HomeData>& homes) override {
+    return change([&homes](Database& database) {
+      Statement find(database, "SELECT position FROM home WHERE uuid = ?");
+      Statement remove(database, "DELETE FROM home WHERE uuid = ?");
+      HomeInserter inserter(database);
+      for (const HomeData& home : homes) {
+        find.bindAll(home.uuid);
+        const bool isKnown = find.step();
+        const std::int64_t position = isKnown ? find.integer(0) : positionAtEnd(database);
+        find.reset();
+        remove.run(home.uuid);
+        inserter.insert(home, position);
+      }
+    });
+  }
+
+  Result<std::vector<HomeData>> loadHomes() override {
+    return read<std::vector<HomeData>>(&loadHomesFrom);
+  }
+
+  Result<std::int64_t> countHomes() override {
+    return read<std::int64_t>(
+        [](Database& database) { return database.number("SELECT count(*) FROM home"); });
+  }
+
+  Status writeValues(const std::vector<ValueChange>& changes) override {
+    NDLock lock(mutex_);
+    try {
+      Transaction transaction(database_, Transaction::Kind::writing);
+      if (!update_) update_ = std::make_unique<Statement>(database_, kUpdate);
+      for (const ValueChange& change : changes) {
+        update_->run(change.home, change.address.accessory, change.address.service,
+                     change.address.characteristic, change.value.has_value(),
+                     change.value.value_or(nullptr), change.deviceValue.has_value(),
+                     change.deviceValue.value_or(nullptr));
+      }
+      transaction.commit();
+    } catch (const DatabaseError& error) {
+      return failureOf(error, name_);
+    }
+    return std::nullopt;
+  }
+
+  Result<std::uint64_t> version() override {
+    NDLock lock(mutex_);
+    try {
+      constexpr int kHalf = 32;
+      if (!dataVersion_) {
+        dataVersion_ = std::make_unique<Statement>(database_, "PRAGMA data_version");
+      }
+      dataVersion_->step();
+      const auto byOthers = static_cast<std::uint64_t>(dataVersion_->integer(0));
+      dataVersion_->reset();
+      return byOthers << kHalf | ownChanges_;
+    } catch (const DatabaseError& error) {
+      return failureOf(error, name_);
+    }
+  }
+
+ private:
+  static constexpr const char* kUpdate =
+      "UPDATE characteristic SET value = iif(?5, ?6, value), "
+      "device_value = iif(?7, ?8, device_value) "
+      "WHERE id = (SELECT characteristic.id FROM home "
+      "JOIN accessory ON accessory.home = home.id AND accessory.uuid = ?2 "
+      "JOIN service ON service.accessory = accessory.id AND service.instance_id = ?3 "
+      "JOIN characteristic ON characteristic.service = service.id "
+      "AND characteristic.instance_id = ?4 WHERE home.uuid = ?1)";
+
+  static std::int64_t positionAtEnd(Database& database) {
+    return database.number("SELECT ifnull(max(position) + 1, 0) FROM home");
+  }
+
+  /// Makes a change of the homes, whole or not at all.
+  template <class Change>
+  Status change(const Change& change) {
+    NDLock lock(mutex_);
+    try {
+      Transaction transaction(database_, Transaction::Kind::writing);
+      change(database_);
+      transaction.commit();
+    } catch (const DatabaseError& error) {
+      return failureOf(error, name_);
+    }
+    ++ownChanges_;
+    return std::nullopt;
+  }
+
+  /// Reads one state of the database.
+  template <class Value, class Read>
+  Result<Value> read(const Read& read) {
+    NDLock lock(mutex_);
+    try {
+      Transaction transaction(database_, Transaction::Kind::reading);
+      Value value = read(database_);
+      transaction.commit();
+      return value;
+    } catch (const DatabaseError& error) {
+      return failureOf(error, name_);
+    }
+  }
+
+  const std::string name_;
+  NDMutex mutex_;
+  Database database_ ND_GUARDED_BY(mutex_);
+  std::unique_ptr<Statement> update_ ND_GUARDED_BY(mutex_);
+  std::unique_ptr<Statement> dataVersion_ ND_GUARDED_BY(mutex_);
+  std::uint32_t ownChanges_ ND_GUARDED_BY(mutex_) = 0;
+};
+
+Result<std::unique_ptr<HomeStore>> openStore(const std::string& path, const std::string& name,
+                                             bool isFile, std::chrono::milliseconds lockTimeout) {
+  try {
+    auto store = std::make_unique<SqliteHomeStore>(path, name, lockTimeout);
+    if (Status failed = store->prepare(isFile)) return *failed;
+    return std::unique_ptr<HomeStore>(std::move(store));
+  } catch (const DatabaseError& error) {
+    return failureOf(error, name);
+  }
+}
+
+}  // namespace
+
+Result<std::unique_ptr<HomeStore>> HomeStore::open(const std::optional<std::filesystem::path>& file,
+                                                   std::chrono::milliseconds lockTimeout) {
+  if (!file) return openStore(Database::kInMemory, "the database in memory", false, lockTimeout);
+  if (Status failed = prepareDatabaseFile(*file)) return *failed;
+  const FolderLock lock(file->parent_path());
+  return openStore(file->string(), file->string(), true, lockTimeout);
+}
+
+}  // namespace nidus

@@ -1,0 +1,30 @@
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "HomePlatform/Store/Database.h"
+
+namespace nidus {
+
+/// The number in the file's header that says that a database is one of ours.
+inline constexpr std::int64_t kSchemaApplicationID = 0x4E494455;
+
+/// What leads from each version of the schema to the next, first from an empty database to version
+/// 1. A step, once released, never changes; a change of the schema is one more step.
+[[nodiscard]] const std::vector<std::string>& schemaSteps();
+
+/// Why a database cannot be used with a list of steps.
+enum class SchemaProblem {
+  notOurs,  ///< It is a database of some other program.
+  newer,    ///< It has been written by a version of the program that knows more steps.
+};
+
+/// Brings `database` to the version that `steps` lead to, in one transaction; several processes may
+/// do so at the same time. Gives what is in the way, none when it is done. Throws `DatabaseError`.
+[[nodiscard]] std::optional<SchemaProblem> applySchema(Database& database,
+                                                       const std::vector<std::string>& steps);
+
+}  // namespace nidus
