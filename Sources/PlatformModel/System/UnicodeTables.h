@@ -3,6 +3,8 @@
 #include <cstdint>
 #include <span>
 
+#include "PlatformModel/System/NDExport.h"
+
 namespace nidus {
 
 /// The version of the Unicode character database that the tables come from.
@@ -26,7 +28,7 @@ struct Decomposition {
   std::uint16_t length;  ///< How many code points it has.
 };
 
-extern const UnicodeVersion kUnicodeVersion;
+extern ND_EXPORT const UnicodeVersion kUnicodeVersion;
 /// In the order of the code points; one that is in no range has class 0 and is no nonspacing mark.
 extern const std::span<const CombiningRange> kCombiningRanges;
 /// In the order of the code points; without the Hangul syllables, which decompose by a rule.

@@ -1,0 +1,111 @@
+#include "PlatformModel/System/NDString.h"
+
+#include <gtest/gtest.h>
+
+#include <latch>
+#include <string>
+#include <thread>
+#include <unordered_set>
+#include <vector>
+
+namespace nidus {
+namespace {
+
+TEST(NDStringTest, NullDiffersFromEmptyText) {
+  const NDString none;
+  const NDString empty = "";
+  EXPECT_FALSE(none);
+  EXPECT_TRUE(empty);
+  EXPECT_FALSE(none == empty);
+  EXPECT_EQ(none.view(), empty.view());
+}
+
+TEST(NDStringTest, NullPointersMakeNull) {
+  const char* const noCharacters = nullptr;
+  EXPECT_FALSE(NDString(noCharacters));
+  EXPECT_FALSE(NDString(nullptr));
+  EXPECT_TRUE(NDString(std::string_view()));
+}
+
+TEST(NDStringTest, KeepsEveryCharacter) {
+  const std::string text("a\0b\xFF", 4);
+  EXPECT_EQ(NDString(text).str(), text);
+  EXPECT_EQ(NDString(text).view().size(), 4U);
+}
+
+TEST(NDStringTest, CopiesShareTheCharacters) {
+  const NDString original = "Kitchen";
+  const NDString copy = original;  // NOLINT(performance-unnecessary-copy-initialization): the test
+  EXPECT_EQ(copy.view().data(), original.view().data());
+}
+
+TEST(NDStringTest, CharactersOutliveTheOriginal) {
+  NDString copy;
+  std::string_view view;
+  {
+    const NDString original = std::string(100, 'x');
+    view = original.view();
+    copy = original;
+  }
+  EXPECT_EQ(view, std::string(100, 'x'));
+}
+
+TEST(NDStringTest, MovedFromTextIsNull) {
+  NDString source = "Hall";
+  const NDString constructed = std::move(source);
+  EXPECT_FALSE(source);  // NOLINT(bugprone-use-after-move): the test
+  NDString assigned = "Kitchen";
+  source = "Attic";
+  assigned = std::move(source);
+  EXPECT_FALSE(source);  // NOLINT(bugprone-use-after-move): the test
+  EXPECT_EQ(constructed, "Hall");
+  EXPECT_EQ(assigned, "Attic");
+}
+
+TEST(NDStringTest, AssignmentToItselfKeepsText) {
+  NDString text = "Hall";
+  NDString& same = text;
+  text = same;
+  EXPECT_EQ(text, "Hall");
+  text = std::move(same);
+  EXPECT_EQ(text, "Hall");
+}
+
+TEST(NDStringTest, EqualityComparesCodePoints) {
+  EXPECT_EQ(NDString("Caf\u00E9"), NDString("Caf\u00E9"));
+  EXPECT_FALSE(NDString("Caf\u00E9") == NDString("Cafe\u0301"));
+  EXPECT_FALSE(NDString("Hall") == NDString("hall"));
+  EXPECT_EQ(NDString(), NDString());
+}
+
+TEST(NDStringTest, NullEqualsNoCharacters) {
+  EXPECT_FALSE(NDString() == "");
+  EXPECT_FALSE(NDString() == std::string_view());
+  EXPECT_EQ(NDString(""), "");
+}
+
+TEST(NDStringTest, EqualTextsHashAlike) {
+  const std::unordered_set<NDString> names = {"Hall", "Attic"};
+  EXPECT_EQ(names.count(std::string("Hall")), 1U);
+  EXPECT_EQ(names.count("Cellar"), 0U);
+}
+
+TEST(NDStringTest, ThreadsCopyAndReleaseTogether) {
+  NDString text = "Kitchen";
+  std::latch start(4);
+  std::vector<std::thread> threads;
+  for (int i = 0; i < 4; ++i) {
+    threads.emplace_back([text, &start] {
+      start.arrive_and_wait();
+      for (int round = 0; round < 1000; ++round) {
+        const NDString copy = text;
+        ASSERT_EQ(copy, "Kitchen");
+      }
+    });
+  }
+  text = nullptr;
+  for (std::thread& thread : threads) thread.join();
+}
+
+}  // namespace
+}  // namespace nidus

@@ -1,0 +1,76 @@
+#include "PlatformModel/System/NDURL.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+namespace nidus {
+namespace {
+
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+TEST(NDURLTest, BuildsTextFromThreeParts) {
+  const NDURLRef url = NDURL::make("x-corvane-nidus", "local", "/home?id=1&x=%20 \u00E9");
+  EXPECT_EQ(url->text(), "x-corvane-nidus://local/home?id=1&x=%20 \u00E9");
+}
+
+TEST(NDURLTest, EachCallGivesNewObject) {
+  const NDURLRef a = NDURL::make("s", "h", "/p");
+  const NDURLRef b = NDURL::make("s", "h", "/p");
+  EXPECT_NE(a, b);
+  EXPECT_EQ(a->text(), b->text());
+}
+
+TEST(NDURLTest, FromTextKeepsText) {
+  const NDString text = "not a URL";
+  EXPECT_EQ(NDURL::fromText(text)->text().view().data(), text.view().data());
+}
+
+struct Parts {
+  const char* text;
+  NDString scheme;
+  std::vector<NDString> components;
+  NDString query;
+};
+
+std::vector<Parts> parts() {
+  return {
+      {"x-corvane-nidus://local/home?id=1", "x-corvane-nidus", {"/", "home"}, "id=1"},
+      {"s://h/service?id=12&accessory=A&home=H", "s", {"/", "service"}, "id=12&accessory=A&home=H"},
+      {"s://h/a/b/?q", "s", {"/", "a", "b"}, "q"},
+      {"s://h//a", "s", {"/", "a"}, nullptr},
+      {"s://h/", "s", {"/"}, nullptr},
+      {"s://h", "s", {}, nullptr},
+      {"s://h?q/r", "s", {}, "q/r"},
+      {"s://h#f?g", "s", {}, nullptr},
+      {"s://h/a#f?g", "s", {"/", "a"}, nullptr},
+      {"s://h/a?q#f", "s", {"/", "a"}, "q"},
+      {"s://h/a?q?r", "s", {"/", "a"}, "q?r"},
+      {"s://h/a?", "s", {"/", "a"}, ""},
+      {"s:/a/b", "s", {"/", "a", "b"}, nullptr},
+      {"s:a", "s", {"a"}, nullptr},
+      {":", "", {}, nullptr},
+      {"/home?id=1:2", nullptr, {"/", "home"}, "id=1:2"},
+      {"//h/a", nullptr, {"/", "a"}, nullptr},
+      {"text", nullptr, {"text"}, nullptr},
+      {"", nullptr, {}, nullptr},
+  };
+}
+
+TEST(NDURLTest, ReadsSchemePathAndQuery) {
+  for (const Parts& expected : parts()) {
+    SCOPED_TRACE(expected.text);
+    const NDURLRef url = NDURL::fromText(expected.text);
+    EXPECT_EQ(url->scheme(), expected.scheme);
+    EXPECT_EQ(url->pathComponents(), expected.components);
+    EXPECT_EQ(url->query(), expected.query);
+  }
+}
+
+TEST(NDURLTest, AnyTextIsRead) {
+  EXPECT_THAT(NDURL::fromText("#")->pathComponents(), IsEmpty());
+  EXPECT_THAT(NDURL::fromText("s:///p")->pathComponents(), ElementsAre(NDString("/"), "p"));
+}
+
+}  // namespace
+}  // namespace nidus
