@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <optional>
-#include <regex>
 
 namespace nidus {
 namespace {
@@ -62,11 +61,19 @@ struct Include {
   bool isQuoted;
 };
 
-std::optional<Include> includeOf(const std::string& line) {
-  static const std::regex kForm(R"(^\s*#\s*include\s*([<"])([^>"]*)[>"].*)");
-  std::smatch match;
-  if (!std::regex_match(line, match, kForm)) return std::nullopt;
-  return Include{match[2].str(), match[1].str() == "\""};
+/// Takes `word` and the blanks before it from the front of `rest`; false when it is not there.
+bool skip(std::string_view& rest, std::string_view word) {
+  const std::size_t begin = std::min(rest.find_first_not_of(" \t"), rest.size());
+  if (!rest.substr(begin).starts_with(word)) return false;
+  rest.remove_prefix(begin + word.size());
+  return true;
+}
+
+std::optional<Include> includeOf(std::string_view line) {
+  if (!skip(line, "#") || !skip(line, "include")) return std::nullopt;
+  const bool isQuoted = skip(line, "\"");
+  if (!isQuoted && !skip(line, "<")) return std::nullopt;
+  return Include{std::string(line.substr(0, line.find_first_of("\">"))), isQuoted};
 }
 
 std::string libraryViolation(const SourceFile& file, const Library& library) {
