@@ -35,9 +35,13 @@ struct HomePlatformOptions {
   std::map<std::string, JsonValue> preferences;
   /// The "InternalBuild" answer of a platform in memory.
   bool internalBuild = false;
-  /// Takes each message that the log passes on; empty sends it to standard error and the system
-  /// log.
+  /// Takes each message that the log passes on, on the thread that sends it; empty sends it to
+  /// standard error and, where the machine has one, to the system log.
   std::function<void(const NDSystemLogMessage&)> logSink;
+  /// Hears of each failure of the platform after it was opened, such as a database that can no
+  /// longer be read: on any thread, once where it happened. What failed is answered all the same,
+  /// with no homes or with errors. Empty writes a line to standard error.
+  std::function<void(const Failure&)> failureHandler;
   /// Hears of each call on a home, before it is answered; may be empty. On any thread.
   std::function<void(const PlatformCall&)> callObserver;
 };
@@ -66,11 +70,15 @@ class HomePlatform : public NDPlatform {
   [[nodiscard]] virtual Status changePreferences(
       const std::map<std::string, JsonValue>& changes) = 0;
 
-  /// Runs work until every queue of the platform is idle: on the calling thread, which also drains
-  /// the main queue. Not to be called from a queue.
+  /// Waits until every queue of the platform is idle; runs the work of the main queue, and with
+  /// `drainsOnCaller` all other work, on the calling thread. Deliveries that the calling thread
+  /// holds back are let go first. Not to be called from a queue.
   virtual void drain() = 0;
-  /// Ends all work and tells the delegates of managers that have not reported that they never will.
-  /// Commands that are pending are freed. The platform can not be used afterwards.
+  /// Ends all work and tells the delegates of managers that have not reported that they never will;
+  /// a manager that is still held back, or made later, tells it when its hold is released. Work and
+  /// completions that were waiting are destroyed without being run; running work is waited for.
+  /// The threads end. Afterwards homes can still be looked at, but their calls are not answered.
+  /// Further calls do nothing; so does the destructor, which shuts down too.
   virtual void shutDown() = 0;
 };
 

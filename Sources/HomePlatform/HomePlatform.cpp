@@ -1,0 +1,57 @@
+#include "HomePlatform/HomePlatform.h"
+
+#include <iostream>
+#include <utility>
+
+#include "HomePlatform/LocalHomePlatform.h"
+#include "HomePlatform/Metadata/VocabularyReader.h"
+#include "HomePlatform/System/DataFolder.h"
+
+namespace nidus {
+namespace {
+
+constexpr const char* kDatabaseName = "home.db";
+constexpr const char* kVocabularyName = "vocabulary.json";
+constexpr const char* kMemoryContainer = "memory";
+
+/// The file of that name in the data folder; none for a platform in memory.
+std::optional<std::filesystem::path> fileOf(const HomePlatformOptions& options, const char* name) {
+  if (!options.dataFolder) return std::nullopt;
+  return *options.dataFolder / name;
+}
+
+void fillIn(HomePlatformOptions& options) {
+  if (!options.logSink) options.logSink = makeMachineLogSink();
+  if (!options.failureHandler) {
+    options.failureHandler = [](const Failure& failure) {
+      std::cerr << "nidus: " + failure.message + '\n' << std::flush;
+    };
+  }
+}
+
+Result<std::shared_ptr<Preferences>> openPreferences(const HomePlatformOptions& options) {
+  if (options.dataFolder) return Preferences::open(*options.dataFolder, options.failureHandler);
+  return Preferences::inMemory(options.preferences, kMemoryContainer);
+}
+
+}  // namespace
+
+Result<std::shared_ptr<HomePlatform>> HomePlatform::open(HomePlatformOptions options) {
+  fillIn(options);
+  if (options.dataFolder) {
+    if (Status failure = prepareDataFolder(*options.dataFolder)) return *failure;
+  }
+  auto vocabulary = loadVocabulary(fileOf(options, kVocabularyName));
+  if (!vocabulary) return vocabulary.failure();
+  auto preferences = openPreferences(options);
+  if (!preferences) return preferences.failure();
+  auto store = HomeStore::open(fileOf(options, kDatabaseName));
+  if (!store) return store.failure();
+  LocalHomePlatform::Parts parts{std::move(*preferences),
+                                 std::make_shared<MetadataMapper>(std::move(*vocabulary)),
+                                 std::move(*store)};
+  return std::shared_ptr<HomePlatform>(
+      std::make_shared<LocalHomePlatform>(std::move(options), std::move(parts)));
+}
+
+}  // namespace nidus

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <vector>
+
+#include "HomePlatform/Drivers/AccessoryDriver.h"
+#include "HomePlatform/Objects/HomeLibrary.h"
+#include "HomePlatform/PlatformCall.h"
+#include "PlatformModel/Home/NDHome.h"
+#include "PlatformModel/System/NDQueue.h"
+
+namespace nidus {
+
+/// What homes are asked to do: answers what concerns a home as a whole, and hands the rest to the
+/// driver of its accessories. May be used from any thread.
+class HomeCalls : public std::enable_shared_from_this<HomeCalls> {
+ public:
+  /// What the calls stand on. `observer` may be empty; nothing else is null or empty.
+  struct Parts {
+    std::shared_ptr<HomeLibrary> library;
+    std::shared_ptr<AccessoryDriver> driver;
+    std::shared_ptr<NDQueue> queue;
+    std::function<void(const PlatformCall&)> observer;
+    std::function<void(const Failure&)> reportFailure;
+  };
+  explicit HomeCalls(Parts parts) : parts_(std::move(parts)) {}
+
+  /// Each returns at once; its completion runs on the queue, exactly once, or is destroyed when the
+  /// queue is shut down.
+  void read(const NDUUID& home, NDArray<NDCharacteristic> characteristics,
+            NDBatchCompletion completion);
+  void write(const NDUUID& home, std::vector<NDCharacteristicWriteRequestTuple> writes,
+             NDBatchCompletion completion);
+  void execute(const NDUUID& home, const NDUUID& actionSet, NDExecuteCompletion completion);
+
+ private:
+  struct CurrentHome;
+
+  [[nodiscard]] CurrentHome findHome(const NDUUID& home) const;
+  void observe(PlatformCall call) const;
+  void runScene(const NDUUID& home, const NDUUID& actionSet, NDExecuteCompletion completion) const;
+
+  const Parts parts_;
+};
+
+}  // namespace nidus

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <filesystem>
+
+#include "HomePlatform/Result.h"
+#include "HomePlatform/System/FileDescriptor.h"
+
+namespace nidus {
+
+/// Makes sure that `folder` is there and may be written: it is made, readable by its owner alone,
+/// when it is missing. An existing folder is left as it is.
+[[nodiscard]] Status prepareDataFolder(const std::filesystem::path& folder);
+
+/// Keeps other processes and threads that lock the same folder out until it is destroyed.
+class FolderLock {
+ public:
+  /// Waits for the lock. `folder` must exist.
+  [[nodiscard]] static Result<FolderLock> take(const std::filesystem::path& folder);
+
+ private:
+  explicit FolderLock(FileDescriptor folder) : folder_(std::move(folder)) {}
+
+  FileDescriptor folder_;
+};
+
+}  // namespace nidus

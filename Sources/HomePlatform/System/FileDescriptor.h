@@ -1,0 +1,31 @@
+#pragma once
+
+#include <unistd.h>
+
+#include <utility>
+
+namespace nidus {
+
+/// Owns an open file, folder or socket of the system and closes it.
+class FileDescriptor {
+ public:
+  /// Takes over `descriptor`; a negative one is none.
+  explicit FileDescriptor(int descriptor = -1) noexcept : descriptor_(descriptor) {}
+  FileDescriptor(FileDescriptor&& other) noexcept
+      : descriptor_(std::exchange(other.descriptor_, -1)) {}
+  FileDescriptor& operator=(FileDescriptor&& other) noexcept {
+    std::swap(descriptor_, other.descriptor_);
+    return *this;
+  }
+  ~FileDescriptor() {
+    if (descriptor_ >= 0) ::close(descriptor_);
+  }
+
+  explicit operator bool() const noexcept { return descriptor_ >= 0; }
+  [[nodiscard]] int get() const noexcept { return descriptor_; }
+
+ private:
+  int descriptor_;
+};
+
+}  // namespace nidus
