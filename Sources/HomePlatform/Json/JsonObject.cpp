@@ -67,17 +67,21 @@ JsonObject::JsonObject(JsonPlaced object)
 }
 
 JsonPlaced JsonObject::required(std::string_view key) {
-  known_.push_back(key);
+  allow(key);
   const JsonValue* value = find(key);
   if (!value) object_.fail("missing required key \"" + std::string(key) + '"');
   return placedAt(key, *value);
 }
 
 std::optional<JsonPlaced> JsonObject::optional(std::string_view key) {
-  known_.push_back(key);
+  allow(key);
   const JsonValue* value = find(key);
   if (!value || std::holds_alternative<std::nullptr_t>(value->content)) return std::nullopt;
   return placedAt(key, *value);
+}
+
+void JsonObject::allow(std::string_view key) {
+  if (std::find(known_.begin(), known_.end(), key) == known_.end()) known_.push_back(key);
 }
 
 void JsonObject::refuseUnknownKeys() const {

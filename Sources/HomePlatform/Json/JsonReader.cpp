@@ -148,8 +148,11 @@ class CheckingHandler {
   bool parse_error(std::size_t, const std::string& token, const nlohmann::json::exception& error) {
     constexpr int kNumberOverflow = 406;
     if (error.id == kNumberOverflow) failBeyondRange(isInteger(token));
-    if (isEmpty_ && token.empty()) throw JsonError{"", "the document is empty"};
-    throw JsonError{"", syntaxMessage(error.what())};
+    const std::string message = syntaxMessage(error.what());
+    if (isEmpty_ && message.find("unexpected end of input") != std::string::npos) {
+      throw JsonError{"", "the document is empty"};
+    }
+    throw JsonError{"", message};
   }
 
  private:

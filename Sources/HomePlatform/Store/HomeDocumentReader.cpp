@@ -56,8 +56,8 @@ class DocumentEvents final : public JsonEvents {
     }
     const JsonValue value = part.rest.take();
     JsonObject object(JsonPlaced(value, path.place()));
-    for (const HomePartReader::List& list : part.reader->lists()) object.allow(list.key);
     part.reader->finish(object);
+    for (const HomePartReader::List& list : part.reader->lists()) object.allow(list.key);
     object.refuseUnknownKeys();
     parts_.pop_back();
   }
