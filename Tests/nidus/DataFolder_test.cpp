@@ -1,0 +1,147 @@
+#include <sqlite3.h>
+
+#include "nidus/ProgramTest.h"
+
+namespace nidus {
+namespace {
+
+using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+
+/// A connection of the test's own to a database.
+class Connection {
+ public:
+  explicit Connection(const std::string& file) { sqlite3_open(file.c_str(), &connection_); }
+  ~Connection() { sqlite3_close(connection_); }
+  Connection(const Connection&) = delete;
+  Connection& operator=(const Connection&) = delete;
+  void run(const char* statement) {
+    ASSERT_EQ(sqlite3_exec(connection_, statement, nullptr, nullptr, nullptr), SQLITE_OK);
+  }
+
+ private:
+  sqlite3* connection_ = nullptr;
+};
+
+class DataFolderTest : public ProgramTest {
+ protected:
+  /// Where the database is when only these variables are set.
+  void expectDatabase(const std::map<std::string, std::optional<std::string>>& environment,
+                      const std::string& file) {
+    ProgramStart export_{{"home", "export"}};
+    export_.environment = {{"NIDUS_DATA", {}}, {"XDG_DATA_HOME", {}}, {"HOME", {}}};
+    for (const auto& [name, value] : environment) export_.environment[name] = value;
+    const ProgramEnd end = runProgram(export_);
+    EXPECT_EQ(end.exitStatus, 0) << end.errors;
+    EXPECT_TRUE(std::filesystem::exists(folder_.path() / file));
+  }
+  [[nodiscard]] std::string database() const { return data() + "/home.db"; }
+  /// What each command that needs the database says.
+  void expectPlatformFailure(const std::string& start) {
+    for (const char* command : {"perform", "sync", "records"}) {
+      const ProgramEnd end = run({command}, "{}\n");
+      EXPECT_EQ(end.exitStatus, 4) << command;
+      EXPECT_THAT(end.output, IsEmpty());
+      EXPECT_THAT(end.errors, IsOneFailure(start));
+    }
+    EXPECT_EQ(run({"home", "show"}).exitStatus, 4);
+    EXPECT_EQ(run({"home", "export"}).exitStatus, 4);
+  }
+};
+
+TEST_F(DataFolderTest, IsTheGivenOne) {
+  EXPECT_EQ(run({"home", "export"}).exitStatus, 0);
+  EXPECT_TRUE(std::filesystem::exists(database()));
+}
+
+TEST_F(DataFolderTest, IsThatOfTheEnvironment) {
+  expectDatabase({{"NIDUS_DATA", folder_.file("own")}, {"XDG_DATA_HOME", folder_.file("xdg")}},
+                 "own/home.db");
+}
+
+TEST_F(DataFolderTest, FollowsTheUsersDataFolder) {
+  expectDatabase({{"XDG_DATA_HOME", folder_.file("xdg")}, {"HOME", folder_.file("home")}},
+                 "xdg/nidus/home.db");
+}
+
+TEST_F(DataFolderTest, IgnoresARelativeDataFolder) {
+  expectDatabase({{"XDG_DATA_HOME", "xdg"}, {"HOME", folder_.file("home")}},
+                 "home/.local/share/nidus/home.db");
+}
+
+TEST_F(DataFolderTest, MustBeKnown) {
+  ProgramStart export_{{"home", "export"}};
+  export_.environment = {{"NIDUS_DATA", ""}, {"XDG_DATA_HOME", {}}, {"HOME", {}}};
+  const ProgramEnd end = runProgram(export_);
+  EXPECT_EQ(end.exitStatus, 2);
+  EXPECT_THAT(end.errors, IsOneFailure("no data folder is known"));
+}
+
+TEST_F(DataFolderTest, FailsBelowAFile) {
+  folder_.write("data", "a file");
+  expectPlatformFailure(data());
+}
+
+TEST_F(DataFolderTest, FailsWithADamagedDatabase) {
+  std::filesystem::create_directory(data());
+  folder_.write("data/home.db", std::string(8192, 'x'));
+  expectPlatformFailure(database() + ": ");
+  EXPECT_EQ(contentOfFile(database()), std::string(8192, 'x'));
+}
+
+TEST_F(DataFolderTest, FailsWithANewerDatabase) {
+  importSmallHome();
+  Connection(database()).run("PRAGMA user_version = 1000");
+  expectPlatformFailure(database() + ": ");
+}
+
+TEST_F(DataFolderTest, FailsToChangeALockedDatabase) {
+  importSmallHome();
+  Connection other(database());
+  other.run("BEGIN EXCLUSIVE");
+  const auto file = folder_.write("b.json", documentOf({emptyHome("Other", 2)}));
+  const ProgramEnd end = run({"home", "import", file});
+  EXPECT_EQ(end.exitStatus, 4);
+  EXPECT_THAT(end.errors, IsOneFailure(database() + ": "));
+  other.run("ROLLBACK");
+  EXPECT_THAT(exported(), HasSubstr("Cottage"));
+}
+
+TEST_F(DataFolderTest, RefusesABadVocabulary) {
+  importSmallHome();
+  folder_.write("data/vocabulary.json", R"({"format": "nidus-vocabulary/1", "words": []})");
+  const ProgramEnd end = run({"records"});
+  EXPECT_NE(end.exitStatus, 0);
+  EXPECT_THAT(end.errors, IsOneFailure(data() + "/vocabulary.json: /words: "));
+}
+
+TEST_F(DataFolderTest, NeedsTheModuleBesideTheProgram) {
+  std::filesystem::create_directory(folder_.path() / "bin");
+  std::filesystem::copy_file(NIDUS_PROGRAM, folder_.path() / "bin/nidus");
+  ProgramStart elsewhere = start({"records"});
+  elsewhere.program = folder_.file("bin/nidus");
+  elsewhere.environment = {
+      {"LD_LIBRARY_PATH",
+       (std::filesystem::path(NIDUS_PROGRAM).parent_path().parent_path() / "lib").string()}};
+  const ProgramEnd end = runProgram(elsewhere);
+  EXPECT_EQ(end.exitStatus, 4);
+  EXPECT_THAT(end.errors, IsOneFailure(folder_.file("lib/nidus/NidusAssistant.so") + ": "));
+}
+
+TEST_F(DataFolderTest, RefusesAModuleThatIsNone) {
+  std::filesystem::create_directories(folder_.path() / "bin");
+  std::filesystem::create_directories(folder_.path() / "lib/nidus");
+  std::filesystem::copy_file(NIDUS_PROGRAM, folder_.path() / "bin/nidus");
+  folder_.write("lib/nidus/NidusAssistant.so", "no module");
+  ProgramStart elsewhere = start({"sync"});
+  elsewhere.program = folder_.file("bin/nidus");
+  elsewhere.environment = {
+      {"LD_LIBRARY_PATH",
+       (std::filesystem::path(NIDUS_PROGRAM).parent_path().parent_path() / "lib").string()}};
+  const ProgramEnd end = runProgram(elsewhere);
+  EXPECT_EQ(end.exitStatus, 4);
+  EXPECT_THAT(end.errors, IsOneFailure(folder_.file("lib/nidus/NidusAssistant.so") + ": "));
+}
+
+}  // namespace
+}  // namespace nidus

@@ -1,0 +1,84 @@
+#include "nidus/ProgramTest.h"
+
+namespace nidus {
+namespace {
+
+using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+
+struct HelpCase {
+  std::vector<std::string> command;
+  std::vector<std::string> mentions;
+};
+
+TEST_F(ProgramTest, HelpsOnEachLevel) {
+  const HelpCase table[] = {
+      {{},
+       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo"}},
+      {{"home"}, {"import", "export", "show", "check"}},
+      {{"home", "import"}, {"FILE", "--merge"}},
+      {{"home", "export"}, {"FILE"}},
+      {{"home", "show"}, {"tree"}},
+      {{"home", "check"}, {"FILE"}},
+      {{"perform"}, {"FILE", "standard input", "Exit status", "\"filter\""}},
+      {{"sync"}, {"reset"}},
+      {{"records"}, {"record a line"}},
+      {{"replay"}, {"SCENARIO"}},
+      {{"demo"}, {"temporary folder"}},
+  };
+  for (const HelpCase& help : table) {
+    std::vector<std::string> arguments = help.command;
+    arguments.emplace_back("--help");
+    const ProgramEnd end = runProgram({arguments});
+    SCOPED_TRACE(end.output);
+    EXPECT_EQ(end.exitStatus, 0);
+    EXPECT_THAT(end.errors, IsEmpty());
+    for (const std::string& mention : help.mentions) EXPECT_THAT(end.output, HasSubstr(mention));
+  }
+}
+
+TEST_F(ProgramTest, TellsItsVersion) {
+  const ProgramEnd end = runProgram({{"--version"}});
+  EXPECT_EQ(end.exitStatus, 0);
+  EXPECT_THAT(end.output, ::testing::MatchesRegex("nidus [0-9]+\\.[0-9]+\\.[0-9]+\n"));
+}
+
+TEST_F(ProgramTest, RefusesBadUsageOnOneLine) {
+  const std::vector<std::vector<std::string>> table = {
+      {},
+      {"dance"},
+      {"home"},
+      {"home", "dance"},
+      {"home", "import"},
+      {"home", "import", "a", "b"},
+      {"home", "check"},
+      {"replay"},
+      {"sync", "extra"},
+      {"--frobnicate"},
+      {"perform", "--merge"},
+      {"--data"},
+  };
+  for (const std::vector<std::string>& arguments : table) {
+    const ProgramEnd end = runProgram({arguments});
+    SCOPED_TRACE(::testing::PrintToString(arguments) + end.errors);
+    EXPECT_EQ(end.exitStatus, 2);
+    EXPECT_THAT(end.output, IsEmpty());
+    EXPECT_THAT(end.errors, IsOneFailure(""));
+    EXPECT_THAT(end.errors, HasSubstr("--help"));
+  }
+}
+
+TEST_F(ProgramTest, ReportsAnOutputThatIsFull) {
+  for (const std::vector<std::string>& arguments :
+       {std::vector<std::string>{"--help"}, {"demo"}, {"home", "show"}, {"home", "export"}}) {
+    ProgramStart full = start(arguments);
+    full.outputFile = "/dev/full";
+    const ProgramEnd end = runProgram(full);
+    SCOPED_TRACE(::testing::PrintToString(arguments) + end.errors);
+    EXPECT_EQ(end.exitStatus, 4);
+    EXPECT_THAT(end.errors, IsOneFailure("standard output: "));
+  }
+}
+
+}  // namespace
+}  // namespace nidus
