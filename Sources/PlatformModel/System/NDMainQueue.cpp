@@ -4,6 +4,11 @@
 
 namespace nidus {
 
+NDMainQueue::~NDMainQueue() {
+  NDTask dropped;
+  while (take(dropped)) dropped = nullptr;
+}
+
 void NDMainQueue::async(NDTask task) {
   std::function<void()> wakeHandler;
   {

@@ -16,12 +16,16 @@ namespace nidus {
 ///
 /// The platform supplies it, the host drains it on one thread at a time; an embedder with a loop of
 /// its own sets a wake handler and drains when its loop turns. Also serves as a queue that tests
-/// and benchmarks drain on the calling thread.
+/// and benchmarks drain on the calling thread. Who drains it keeps it alive meanwhile.
 ///
 ///     queue->setWakeHandler([&loop] { loop.wake(); });
 ///     queue->drain();
 class ND_EXPORT NDMainQueue final : public NDQueue {
  public:
+  NDMainQueue() = default;
+  /// Destroys the work that is left, which may add work: that is destroyed too.
+  ~NDMainQueue() override;
+
   void async(NDTask task) override;
 
   /// Runs one piece of work on the calling thread; false when there was none.

@@ -124,5 +124,17 @@ TEST_F(NDMainQueueTest, DestroysWorkThatIsLeft) {
   EXPECT_TRUE(isHeld.expired());
 }
 
+TEST_F(NDMainQueueTest, WorkThatIsLeftMayAddWork) {
+  auto held = std::make_shared<int>();
+  const std::weak_ptr<int> isHeld = held;
+  {
+    NDMainQueue queue;
+    const std::shared_ptr<void> adder(
+        nullptr, [&queue, held = std::move(held)](void*) { queue.async([held] { FAIL(); }); });
+    queue.async([adder] {});
+  }
+  EXPECT_TRUE(isHeld.expired());
+}
+
 }  // namespace
 }  // namespace nidus
