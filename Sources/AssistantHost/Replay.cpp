@@ -118,7 +118,7 @@ class StepRunner {
     line.erase(line.rfind('}'));
     std::ostringstream document;
     writeHomeDocument(document, *homes, false);
-    return line + ",\"home\":" + document.str() + "}\n";
+    return line + ", \"home\": " + document.str() + "}\n";
   }
 
   static std::vector<SyncChange> changesOf(const SyncStep& step, SyncClient& sync) {

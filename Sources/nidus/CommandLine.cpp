@@ -68,9 +68,19 @@ void declareProgram(CommandSyntax& program, Settings& settings) {
   declareDemo(program);
 }
 
+/// The command that the arguments have led to: "nidus home".
+std::string commandOf(const CLI::App& app) {
+  const auto below = app.get_subcommands();
+  return app.get_name() + (below.empty() ? "" : ' ' + commandOf(*below.front()));
+}
+
 ExitStatus reportUsage(const CLI::App& app, const CLI::ParseError& error) {
-  return report(
-      {Failure::Kind::badInput, std::string(error.what()) + "; see " + app.get_name() + " --help"});
+  const auto unknown = app.remaining(true);
+  const bool isCommandMissing = dynamic_cast<const CLI::RequiredError*>(&error) != nullptr;
+  const std::string reason = isCommandMissing && !unknown.empty()
+                                 ? "there is no command " + unknown.front()
+                                 : std::string(error.what());
+  return report({Failure::Kind::badInput, reason + "; see " + commandOf(app) + " --help"});
 }
 
 ExitStatus parseAndRun(CLI::App& app, int argc, const char* const* argv,

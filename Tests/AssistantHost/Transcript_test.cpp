@@ -22,9 +22,9 @@ TEST(TranscriptTest, WritesAReadInOrder) {
   call.characteristics = {{kAccessory, 8, 10}, {kAccessory, 8, 9}};
   EXPECT_EQ(
       jsonLine(transcriptOf(call)),
-      R"({"call":"read","home":"AA00AA00-0000-4000-8000-000000000001","characteristics":[)"
-      R"({"accessory":"DD00DD00-0000-4000-8000-00000000000D","service":8,"characteristic":10},)"
-      R"({"accessory":"DD00DD00-0000-4000-8000-00000000000D","service":8,"characteristic":9}]})"
+      R"({"call": "read", "home": "AA00AA00-0000-4000-8000-000000000001", "characteristics": [)"
+      R"({"accessory": "DD00DD00-0000-4000-8000-00000000000D", "service": 8, "characteristic": 10}, )"
+      R"({"accessory": "DD00DD00-0000-4000-8000-00000000000D", "service": 8, "characteristic": 9}]})"
       "\n");
 }
 
@@ -49,9 +49,9 @@ TEST(TranscriptTest, WritesValuesAsTheyWerePassed) {
     EXPECT_EQ(
         jsonLine(transcriptOf(call)),
         std::string(
-            R"({"call":"write","home":"AA00AA00-0000-4000-8000-000000000001","writes":[)"
-            R"({"accessory":"DD00DD00-0000-4000-8000-00000000000D","service":8,"characteristic":9,)"
-            R"("value":)") +
+            R"({"call": "write", "home": "AA00AA00-0000-4000-8000-000000000001", "writes": [)"
+            R"({"accessory": "DD00DD00-0000-4000-8000-00000000000D", "service": 8, "characteristic": 9, )"
+            R"("value": )") +
             written.json + "}]}\n");
   }
 }
@@ -60,8 +60,8 @@ TEST(TranscriptTest, WritesTheSceneThatRan) {
   PlatformCall call = callOf(PlatformCall::Kind::execute);
   call.actionSet = kAccessory;
   EXPECT_EQ(jsonLine(transcriptOf(call)),
-            R"({"call":"execute","home":"AA00AA00-0000-4000-8000-000000000001",)"
-            R"("actionSet":"DD00DD00-0000-4000-8000-00000000000D"})"
+            R"({"call": "execute", "home": "AA00AA00-0000-4000-8000-000000000001", )"
+            R"("actionSet": "DD00DD00-0000-4000-8000-00000000000D"})"
             "\n");
 }
 
@@ -69,17 +69,17 @@ TEST(TranscriptTest, WritesAMessageWithoutItsText) {
   NDSystemLogMessage message;
   message.set("Facility", "f");
   message.set("Level", "3");
-  EXPECT_EQ(jsonLine(transcriptOf(message)), "{\"Level\":\"3\",\"Facility\":\"f\"}\n");
+  EXPECT_EQ(jsonLine(transcriptOf(message)), "{\"Level\": \"3\", \"Facility\": \"f\"}\n");
   message.set("Message", "");
   EXPECT_EQ(jsonLine(transcriptOf(message)),
-            "{\"Level\":\"3\",\"Facility\":\"f\",\"Message\":\"\"}\n");
+            "{\"Level\": \"3\", \"Facility\": \"f\", \"Message\": \"\"}\n");
 }
 
 TEST(TranscriptTest, WritesTheEndMarker) {
   EXPECT_EQ(jsonLine(transcriptOf(SyncChange{"2", nullptr, "2"})),
-            "{\"after\":\"2\",\"object\":null,\"postAnchor\":\"2\"}\n");
+            "{\"after\": \"2\", \"object\": null, \"postAnchor\": \"2\"}\n");
   EXPECT_EQ(jsonLine(transcriptOf(SyncChange{nullptr, nullptr, nullptr})),
-            "{\"after\":null,\"object\":null,\"postAnchor\":null}\n");
+            "{\"after\": null, \"object\": null, \"postAnchor\": null}\n");
 }
 
 }  // namespace

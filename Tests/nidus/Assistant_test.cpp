@@ -21,23 +21,23 @@ TEST_F(SyncCommandTest, PrintsTheResetThenEachName) {
   importSmallHome();
   const ProgramEnd end = run({"sync"});
   EXPECT_EQ(end.exitStatus, 0) << end.errors;
-  EXPECT_THAT(end.output, StartsWith("{\"reset\":\"3405691582\"}\n{\"object\":{"));
-  EXPECT_THAT(end.output, AllOf(HasSubstr("\"postAnchor\":\"1\"}\n"), HasSubstr("Downstairs"),
-                                HasSubstr("Night"), Not(HasSubstr("\"object\":null"))));
-  EXPECT_THAT(end.output, ::testing::EndsWith("\"postAnchor\":\"3405691582\"}\n"));
+  EXPECT_THAT(end.output, StartsWith("{\"reset\": \"3405691582\"}\n{\"object\": {"));
+  EXPECT_THAT(end.output, AllOf(HasSubstr("\"postAnchor\": \"1\"}\n"), HasSubstr("Downstairs"),
+                                HasSubstr("Night"), Not(HasSubstr("\"object\": null"))));
+  EXPECT_THAT(end.output, ::testing::EndsWith("\"postAnchor\": \"3405691582\"}\n"));
 }
 
 TEST_F(SyncCommandTest, ResetsWithoutValidityWithoutHomes) {
   const ProgramEnd end = run({"sync"});
   EXPECT_EQ(end.exitStatus, 0) << end.errors;
-  EXPECT_EQ(end.output, "{\"reset\":null}\n");
+  EXPECT_EQ(end.output, "{\"reset\": null}\n");
 }
 
 TEST_F(RecordsCommandTest, PrintsOneRecordPerLine) {
   importSmallHome();
   const ProgramEnd end = run({"records"});
   EXPECT_EQ(end.exitStatus, 0) << end.errors;
-  EXPECT_THAT(end.output, StartsWith("{\"objectType\":\"HOME\""));
+  EXPECT_THAT(end.output, StartsWith("{\"objectType\": \"HOME\""));
   // The home, three services, a group, a room, a zone and a scene.
   EXPECT_EQ(std::count(end.output.begin(), end.output.end(), '\n'), 8);
 }
@@ -60,9 +60,9 @@ TEST_F(ReplayCommandTest, PrintsOneLinePerStep) {
                                          setCommandLine("Lamp", false) + R"(}, {"export": {}})"));
   const ProgramEnd end = run({"replay", file});
   EXPECT_EQ(end.exitStatus, 0) << end.errors;
-  EXPECT_THAT(end.output, StartsWith("{\"step\":0}\n{\"step\":1,\"replies\":[{"));
-  EXPECT_THAT(end.output, AllOf(HasSubstr("\"call\":\"write\""), HasSubstr("\"log\":[]}\n"),
-                                HasSubstr("{\"step\":2,\"home\":{\"format\"")));
+  EXPECT_THAT(end.output, StartsWith("{\"step\": 0}\n{\"step\": 1, \"replies\": [{"));
+  EXPECT_THAT(end.output, AllOf(HasSubstr("\"call\": \"write\""), HasSubstr("\"log\": []}\n"),
+                                HasSubstr("{\"step\": 2, \"home\": {\"format\"")));
 }
 
 TEST_F(ReplayCommandTest, LeavesTheDataFolderAlone) {
@@ -84,7 +84,7 @@ TEST_F(ReplayCommandTest, HasWrittenTheLinesBeforeAnAbort) {
       folder_.write("a.json", scenarioOf(R"({"set": {}}, {"sync": {"key": "other"}})"));
   const ProgramEnd end = run({"replay", file});
   EXPECT_EQ(end.signal, SIGABRT);
-  EXPECT_EQ(end.output, "{\"step\":0}\n");
+  EXPECT_EQ(end.output, "{\"step\": 0}\n");
   EXPECT_THAT(end.errors, HasSubstr("com.corvane.nidus.name"));
 }
 
@@ -94,7 +94,8 @@ TEST_F(ReplayCommandTest, EndsWithAPendingCommand) {
       scenarioOf(R"({"set": {"silent": true}}, {"perform": )" + readCommandLine("Lamp") + "}"));
   const ProgramEnd end = run({"replay", file});
   EXPECT_EQ(end.exitStatus, 0) << end.errors;
-  EXPECT_THAT(end.output, HasSubstr("{\"step\":1,\"replies\":[],\"platform\":[],\"log\":[]}"));
+  EXPECT_THAT(end.output,
+              HasSubstr("{\"step\": 1, \"replies\": [], \"platform\": [], \"log\": []}"));
 }
 
 TEST_F(DemoCommandTest, ShowsWhatIsExpected) {

@@ -22,7 +22,7 @@ TEST_F(PerformTest, SucceedsWithAReply) {
   const ProgramEnd end = run({"perform"}, readCommandLine("Lamp") + "\n");
   EXPECT_EQ(end.exitStatus, 0);
   EXPECT_EQ(linesOf(end.output), 1U);
-  EXPECT_THAT(end.output, AllOf(HasSubstr("COMMAND_SUCCESS"), HasSubstr("\"boolean\":true")));
+  EXPECT_THAT(end.output, AllOf(HasSubstr("COMMAND_SUCCESS"), HasSubstr("\"boolean\": true")));
   EXPECT_THAT(end.errors, IsEmpty());
 }
 
@@ -48,7 +48,7 @@ TEST_F(PerformTest, KnowsWhetherTheDeviceIsLocked) {
 
 TEST_F(PerformTest, KeepsWhatItHasWritten) {
   EXPECT_EQ(run({"perform"}, setCommandLine("Lamp", false)).exitStatus, 0);
-  EXPECT_THAT(run({"perform"}, readCommandLine("Lamp")).output, HasSubstr("\"boolean\":false"));
+  EXPECT_THAT(run({"perform"}, readCommandLine("Lamp")).output, HasSubstr("\"boolean\": false"));
 }
 
 TEST_F(PerformTest, AnswersInOrderWithTheHighestStatus) {
@@ -78,9 +78,9 @@ TEST_F(PerformTest, CountsBlankLines) {
 TEST_F(PerformTest, AnswersALineBeforeTheNext) {
   ProgramProcess process(start({"perform"}));
   process.write(setCommandLine("Lamp", false) + "\n");
-  EXPECT_THAT(process.readLine().value_or(""), HasSubstr("\"boolean\":false"));
+  EXPECT_THAT(process.readLine().value_or(""), HasSubstr("\"boolean\": false"));
   process.write(setCommandLine("Lamp", true) + "\n");
-  EXPECT_THAT(process.readLine().value_or(""), HasSubstr("\"boolean\":true"));
+  EXPECT_THAT(process.readLine().value_or(""), HasSubstr("\"boolean\": true"));
   const ProgramEnd end = process.finish();
   EXPECT_EQ(end.exitStatus, 0) << end.errors;
   EXPECT_THAT(end.output, IsEmpty());
@@ -97,7 +97,7 @@ TEST_F(PerformTest, ReadsAFileOfLines) {
 
 TEST_F(PerformTest, ReadsAFileWhoseFirstLineIsBad) {
   const auto file =
-      folder_.write("commands.jsonl", "{\"filter\":\n" + readCommandLine("Lamp") + "\n");
+      folder_.write("commands.jsonl", "{\"filter\": \n" + readCommandLine("Lamp") + "\n");
   const ProgramEnd end = run({"perform", file});
   EXPECT_EQ(end.exitStatus, 2);
   EXPECT_EQ(linesOf(end.output), 1U);
@@ -179,7 +179,7 @@ TEST_F(PerformTest, StopsWhenNobodyReadsTheReplies) {
   const ProgramEnd end = runProgram(full);
   EXPECT_EQ(end.exitStatus, 4);
   EXPECT_THAT(end.errors, IsOneFailure("standard output: "));
-  EXPECT_THAT(run({"perform"}, readCommandLine("Lamp")).output, HasSubstr("\"boolean\":true"));
+  EXPECT_THAT(run({"perform"}, readCommandLine("Lamp")).output, HasSubstr("\"boolean\": true"));
 }
 
 TEST_F(PerformTest, SharesOneDataFolderAmongProcesses) {
@@ -190,7 +190,7 @@ TEST_F(PerformTest, SharesOneDataFolderAmongProcesses) {
     ASSERT_TRUE(first.readLine());
     second.write(readCommandLine("Lamp") + "\n");
     EXPECT_THAT(second.readLine().value_or(""),
-                HasSubstr(isOn ? "\"boolean\":true" : "\"boolean\":false"));
+                HasSubstr(isOn ? "\"boolean\": true" : "\"boolean\": false"));
   }
 }
 

@@ -105,7 +105,8 @@ void declarePerform(CommandSyntax& program, const Settings& settings) {
       "is one line. Lines of standard input are answered before the next one is read.\n\n"
       "Example: which lights of the kitchen are on?\n"
       "  {\"filter\": {\"search\": {\"roomName\": \"Kitchen\", \"serviceType\": \"LIGHT\"}},\n"
-      "   \"actions\": [{\"actionType\": \"GET\", \"attribute\": \"POWER\"}]}\n\n"
+      "   \"actions\": [{\"actionType\": \"GET\",\n    \"attribute\": \"POWER\", \"value\": "
+      "{\"boolean\": true}}]}\n\n"
       "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform\n"
       "failed; the highest of all commands.");
   syntax.argument("FILE", *file, "The commands; standard input when it is left out or -");
