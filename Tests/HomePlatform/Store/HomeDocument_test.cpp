@@ -11,8 +11,6 @@
 namespace nidus {
 namespace {
 
-using test::documentOf;
-using test::RandomHome;
 using testing::HasSubstr;
 using testing::StartsWith;
 

@@ -10,7 +10,7 @@
 #include "HomePlatform/Store/HomeDocument.h"
 #include "HomePlatform/Store/ValueConversion.h"
 
-namespace nidus::test {
+namespace nidus {
 namespace {
 
 constexpr const char* kNames[] = {"Kitchen", "",       "Küche",          "Zoë's \"den\"",
@@ -194,4 +194,4 @@ std::string documentOf(const std::vector<HomeData>& homes) {
   return out.str();
 }
 
-}  // namespace nidus::test
+}  // namespace nidus

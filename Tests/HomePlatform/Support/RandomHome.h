@@ -5,7 +5,7 @@
 
 #include "HomePlatform/Store/HomeData.h"
 
-namespace nidus::test {
+namespace nidus {
 
 /// Makes homes that a home document may hold: every kind of part, absent and present optional keys,
 /// values of each kind and format at the ends of their ranges, references between the parts. The
@@ -41,4 +41,4 @@ class RandomHome {
 /// The document of `homes`, as a text that can be compared.
 [[nodiscard]] std::string documentOf(const std::vector<HomeData>& homes);
 
-}  // namespace nidus::test
+}  // namespace nidus
