@@ -21,29 +21,29 @@ namespace nidus {
 struct HomePlatformOptions {
   /// Where the database, the preferences and the vocabulary are; it is made when it is missing.
   /// None keeps everything in memory, uses the built-in vocabulary alone and touches no file.
-  std::optional<std::filesystem::path> dataFolder;
+  std::optional<std::filesystem::path> dataFolder = std::nullopt;
   /// Whether the device is locked.
   bool locked = false;
   /// Runs all work on the thread that drains (`drain`, or a wait): no thread is started, and a wait
   /// that nothing can end is over at once, as if its time had passed.
   bool drainsOnCaller = false;
   /// The clock of all waits; null takes the machine's, or, with `drainsOnCaller`, the jumping one.
-  std::shared_ptr<NDClock> clock;
+  std::shared_ptr<NDClock> clock = nullptr;
   /// The metric flag; none takes it from the environment's locale.
-  std::optional<bool> metric;
+  std::optional<bool> metric = std::nullopt;
   /// Preferences of a platform in memory.
-  std::map<std::string, JsonValue> preferences;
+  std::map<std::string, JsonValue> preferences = {};
   /// The "InternalBuild" answer of a platform in memory.
   bool internalBuild = false;
   /// Takes each message that the log passes on, on the thread that sends it; empty sends it to
   /// standard error and, where the machine has one, to the system log.
-  std::function<void(const NDSystemLogMessage&)> logSink;
+  std::function<void(const NDSystemLogMessage&)> logSink = nullptr;
   /// Hears of each failure of the platform after it was opened, such as a database that can no
   /// longer be read: on any thread, once where it happened. What failed is answered all the same,
   /// with no homes or with errors. Empty writes a line to standard error.
-  std::function<void(const Failure&)> failureHandler;
+  std::function<void(const Failure&)> failureHandler = nullptr;
   /// Hears of each call on a home, before it is answered; may be empty. On any thread.
-  std::function<void(const PlatformCall&)> callObserver;
+  std::function<void(const PlatformCall&)> callObserver = nullptr;
 };
 
 /// The home platform of one machine: homes from a database, accessories behind drivers.

@@ -110,12 +110,14 @@ bool SimulatedDriver::begin(Batch& batch) const {
 
 DriverAnswers SimulatedDriver::readBatch(const NDUUID& home,
                                          const std::vector<CharacteristicAddress>& targets) const {
-  Batch batch{home};
-  if (!begin(batch)) return DriverAnswers(targets.size(), kErrorNotKept);
-  batch.answers.reserve(targets.size());
-  for (const auto& target : targets) batch.answers.push_back(readOne(batch, target));
-  keep(batch);
-  return std::move(batch.answers);
+  for (;;) {
+    Batch batch{home};
+    if (!begin(batch)) return DriverAnswers(targets.size(), kErrorNotKept);
+    batch.answers.reserve(targets.size());
+    for (const auto& target : targets) batch.answers.push_back(readOne(batch, target));
+    // A value that another process has written meanwhile must not stay covered by an older one.
+    if (!keep(batch) || !isOutdated(batch)) return std::move(batch.answers);
+  }
 }
 
 DriverAnswers SimulatedDriver::writeBatch(const NDUUID& home,
@@ -124,7 +126,7 @@ DriverAnswers SimulatedDriver::writeBatch(const NDUUID& home,
   if (!begin(batch)) return DriverAnswers(writes.size(), kErrorNotKept);
   batch.answers.reserve(writes.size());
   for (const auto& write : writes) batch.answers.push_back(writeOne(batch, write));
-  keep(batch);
+  if (keep(batch) && isOutdated(batch)) answerGoneTargets(batch);
   return std::move(batch.answers);
 }
 
@@ -183,26 +185,30 @@ void SimulatedDriver::follow(Batch& batch, const Target& written, const NDValueR
   if (followed) batch.changes.push_back({batch.homeID, object.address(), followed, followed});
 }
 
-/// Keeps what the batch has changed in one transaction. Nothing is answered as done that was not
-/// kept.
-void SimulatedDriver::keep(Batch& batch) const {
-  if (batch.changes.empty()) return;
-  if (const Status failure = library_->keep(batch.changes)) {
-    reportFailure_(*failure);
-    for (const auto& [index, address] : batch.kept) batch.answers[index] = kErrorNotKept;
-    return;
-  }
-  answerGoneTargets(batch);
+/// Keeps what the batch has changed in one transaction; false when nothing was kept. Nothing is
+/// answered as done that was not kept.
+bool SimulatedDriver::keep(Batch& batch) const {
+  if (batch.changes.empty()) return false;
+  const Status failure = library_->keep(batch.changes);
+  if (!failure) return true;
+  reportFailure_(*failure);
+  for (const auto& [index, address] : batch.kept) batch.answers[index] = kErrorNotKept;
+  return false;
 }
 
-/// Another process may have replaced the homes since the batch began; values of what is no longer
-/// there were passed over.
-void SimulatedDriver::answerGoneTargets(Batch& batch) const {
+/// Says whether the database has been changed by others since the batch began. One that fails now
+/// has taken the values all the same.
+bool SimulatedDriver::isOutdated(const Batch& batch) const {
   const Result<std::shared_ptr<const HomeEdition>> edition = library_->current();
-  if (!edition || *edition == batch.edition) return;
-  const auto home = (*edition)->find(batch.homeID);
+  return edition && *edition != batch.edition;
+}
+
+/// Values of what is no longer there were passed over.
+void SimulatedDriver::answerGoneTargets(Batch& batch) const {
+  if (!begin(batch)) return;
   for (const auto& [index, address] : batch.kept) {
-    if (!home || !home->find(address).characteristic) batch.answers[index] = kNDErrorUnreachable;
+    const bool isThere = batch.home && batch.home->find(address).characteristic;
+    if (!isThere) batch.answers[index] = kNDErrorUnreachable;
   }
 }
 

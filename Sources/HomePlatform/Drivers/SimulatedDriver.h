@@ -44,7 +44,8 @@ class SimulatedDriver final : public AccessoryDriver,
   [[nodiscard]] std::int64_t readOne(Batch& batch, const CharacteristicAddress& address) const;
   [[nodiscard]] std::int64_t writeOne(Batch& batch, const DriverWrite& write) const;
   void follow(Batch& batch, const Target& written, const NDValueRef& value) const;
-  void keep(Batch& batch) const;
+  [[nodiscard]] bool keep(Batch& batch) const;
+  [[nodiscard]] bool isOutdated(const Batch& batch) const;
   void answerGoneTargets(Batch& batch) const;
 
   const std::shared_ptr<HomeLibrary> library_;
