@@ -4,9 +4,8 @@
 #include <gtest/gtest.h>
 
 #include <atomic>
-#include <latch>
-#include <thread>
-#include <vector>
+
+#include "PlatformModel/RunOnThreads.h"
 
 namespace nidus {
 namespace {
@@ -83,17 +82,11 @@ TEST_F(NDPlatformTest, UnregistersOnlyTheRegisteredOne) {
 
 TEST_F(NDPlatformTest, OneOfManyThreadsRegisters) {
   std::atomic<int> accepted{0};
-  std::latch start(4);
-  std::vector<std::thread> threads;
-  for (int i = 0; i < 4; ++i) {
-    threads.emplace_back([&] {
-      const auto platform = std::make_shared<MockPlatform>();
-      start.arrive_and_wait();
-      if (NDPlatform::registerPlatform(platform).empty()) ++accepted;
-      EXPECT_NE(NDPlatform::registered(), nullptr);
-    });
-  }
-  for (std::thread& thread : threads) thread.join();
+  runOnThreads(4, [&accepted](std::size_t) {
+    const auto platform = std::make_shared<MockPlatform>();
+    if (NDPlatform::registerPlatform(platform).empty()) ++accepted;
+    EXPECT_NE(NDPlatform::registered(), nullptr);
+  });
   EXPECT_EQ(accepted, 1);
 }
 

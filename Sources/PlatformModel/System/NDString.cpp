@@ -47,8 +47,8 @@ NDString::NDString(const NDString& other) noexcept : text_(Text::retain(other.te
 NDString::NDString(NDString&& other) noexcept : text_(std::exchange(other.text_, nullptr)) {}
 
 NDString& NDString::operator=(const NDString& other) noexcept {
-  Text* const retained = Text::retain(other.text_);  // first, for the assignment to itself
-  Text::release(std::exchange(text_, retained));
+  NDString copy(other);
+  std::swap(text_, copy.text_);
   return *this;
 }
 

@@ -61,9 +61,9 @@ bool appendHangul(std::u32string& out, char32_t codePoint) {
   constexpr char32_t kSyllables = 19 * kVowels * kTrails;
   if (codePoint < kFirstSyllable || codePoint >= kFirstSyllable + kSyllables) return false;
   const char32_t index = codePoint - kFirstSyllable;
-  out += kLeadBase + index / (kVowels * kTrails);
-  out += kVowelBase + index / kTrails % kVowels;
-  if (index % kTrails != 0) out += kTrailBase + index % kTrails;
+  out.push_back(kLeadBase + index / (kVowels * kTrails));
+  out.push_back(kVowelBase + index / kTrails % kVowels);
+  if (index % kTrails != 0) out.push_back(kTrailBase + index % kTrails);
   return true;
 }
 

@@ -38,6 +38,7 @@ class ND_EXPORT NDUUID {
   [[nodiscard]] constexpr const std::array<std::uint8_t, 16>& bytes() const noexcept {
     return bytes_;
   }
+  // NOLINTNEXTLINE(modernize-use-nullptr): the check takes the default for a null pointer
   friend constexpr auto operator<=>(const NDUUID&, const NDUUID&) noexcept = default;
 
  private:

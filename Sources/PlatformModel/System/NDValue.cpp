@@ -25,13 +25,18 @@ std::partial_ordering compareNumbers(std::int64_t a, float b) noexcept {
   if (b < -kIntegerEnd) return std::partial_ordering::greater;
   const float whole = std::trunc(b);
   const std::partial_ordering byWhole = a <=> static_cast<std::int64_t>(whole);
-  return byWhole != 0 ? byWhole : 0.0F <=> b - whole;
+  return std::is_neq(byWhole) ? byWhole : 0.0F <=> b - whole;
+}
+
+std::partial_ordering reversed(std::partial_ordering order) noexcept {
+  if (std::is_lt(order)) return std::partial_ordering::greater;
+  return std::is_gt(order) ? std::partial_ordering::less : order;
 }
 
 std::partial_ordering compareNumbers(std::int64_t a, std::int64_t b) noexcept { return a <=> b; }
 std::partial_ordering compareNumbers(float a, float b) noexcept { return a <=> b; }
 std::partial_ordering compareNumbers(float a, std::int64_t b) noexcept {
-  return 0 <=> compareNumbers(b, a);
+  return reversed(compareNumbers(b, a));
 }
 
 }  // namespace
@@ -94,7 +99,7 @@ bool NDValue::isEqual(const NDValue& other) const noexcept {
   if (isText() || other.isText()) {
     return isText() && other.isText() && stringValue() == other.stringValue();
   }
-  return compareWith(other) == 0;
+  return std::is_eq(compareWith(other));
 }
 
 std::string NDValue::description() const {

@@ -10,6 +10,8 @@
 #include <thread>
 #include <vector>
 
+#include "PlatformModel/RunOnThreads.h"
+
 namespace nidus {
 namespace {
 
@@ -29,13 +31,9 @@ TEST(NDConcurrentQueueTest, RunsEachPieceOnce) {
 TEST(NDConcurrentQueueTest, TakesWorkFromManyThreads) {
   NDConcurrentQueue queue(3);
   std::atomic<int> runs{0};
-  std::vector<std::thread> adders;
-  for (int i = 0; i < 4; ++i) {
-    adders.emplace_back([&] {
-      for (int piece = 0; piece < 250; ++piece) queue.async([&runs] { ++runs; });
-    });
-  }
-  for (std::thread& adder : adders) adder.join();
+  runOnThreads(4, [&queue, &runs](std::size_t) {
+    for (int piece = 0; piece < 250; ++piece) queue.async([&runs] { ++runs; });
+  });
   queue.waitUntilIdle();
   EXPECT_EQ(runs, 1000);
 }

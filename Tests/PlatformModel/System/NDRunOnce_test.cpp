@@ -2,9 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include <latch>
-#include <thread>
-#include <vector>
+#include "PlatformModel/RunOnThreads.h"
 
 namespace nidus {
 namespace {
@@ -19,17 +17,11 @@ TEST(NDRunOnceTest, RunsFirstWorkAlone) {
 
 TEST(NDRunOnceTest, OthersWaitForItsEnd) {
   NDRunOnce once;
-  std::latch start(4);
   int value = 0;
-  std::vector<std::thread> threads;
-  for (int i = 0; i < 4; ++i) {
-    threads.emplace_back([&] {
-      start.arrive_and_wait();
-      once.run([&value] { ++value; });
-      EXPECT_EQ(value, 1);
-    });
-  }
-  for (std::thread& thread : threads) thread.join();
+  runOnThreads(4, [&once, &value](std::size_t) {
+    once.run([&value] { ++value; });
+    EXPECT_EQ(value, 1);
+  });
 }
 
 }  // namespace

@@ -7,9 +7,9 @@
 #include <future>
 #include <memory>
 #include <string>
-#include <thread>
 #include <vector>
 
+#include "PlatformModel/RunOnThreads.h"
 #include "PlatformModel/System/NDConcurrentQueue.h"
 #include "PlatformModel/System/NDMainQueue.h"
 
@@ -22,18 +22,15 @@ TEST(NDSerialQueueTest, KeepsItsLabel) {
 }
 
 TEST(NDSerialQueueTest, KeepsOrderUnderLoad) {
-  constexpr int kThreads = 4;
+  constexpr std::size_t kThreads = 4;
   constexpr int kEach = 500;
   const auto target = std::make_shared<NDConcurrentQueue>(4);
   NDSerialQueue queue("load", target);
   std::array<std::vector<int>, kThreads> seen;  // written by the queue's work alone
-  std::vector<std::thread> adders;
-  for (auto& numbers : seen) {
-    adders.emplace_back([&queue, &numbers] {
-      for (int i = 0; i < kEach; ++i) queue.async([&numbers, i] { numbers.push_back(i); });
-    });
-  }
-  for (std::thread& adder : adders) adder.join();
+  runOnThreads(seen.size(), [&queue, &seen](std::size_t number) {
+    auto& numbers = seen[number];
+    for (int i = 0; i < kEach; ++i) queue.async([&numbers, i] { numbers.push_back(i); });
+  });
   target->waitUntilIdle();
   for (const auto& numbers : seen) {
     ASSERT_EQ(numbers.size(), std::size_t{kEach});

@@ -2,11 +2,10 @@
 
 #include <gtest/gtest.h>
 
-#include <latch>
 #include <string>
-#include <thread>
 #include <unordered_set>
-#include <vector>
+
+#include "PlatformModel/RunOnThreads.h"
 
 namespace nidus {
 namespace {
@@ -80,7 +79,8 @@ TEST(NDStringTest, EqualityComparesCodePoints) {
 
 TEST(NDStringTest, NullEqualsNoCharacters) {
   EXPECT_FALSE(NDString() == "");
-  EXPECT_FALSE(NDString() == std::string_view());
+  const std::string_view noCharacters;
+  EXPECT_FALSE(NDString() == noCharacters);
   EXPECT_EQ(NDString(""), "");
 }
 
@@ -91,20 +91,14 @@ TEST(NDStringTest, EqualTextsHashAlike) {
 }
 
 TEST(NDStringTest, ThreadsCopyAndReleaseTogether) {
-  NDString text = "Kitchen";
-  std::latch start(4);
-  std::vector<std::thread> threads;
-  for (int i = 0; i < 4; ++i) {
-    threads.emplace_back([text, &start] {
-      start.arrive_and_wait();
-      for (int round = 0; round < 1000; ++round) {
-        const NDString copy = text;
-        ASSERT_EQ(copy, "Kitchen");
-      }
-    });
-  }
-  text = nullptr;
-  for (std::thread& thread : threads) thread.join();
+  const NDString text = "Kitchen";
+  runOnThreads(4, [text](std::size_t) {
+    for (int round = 0; round < 1000; ++round) {
+      NDString copy;
+      copy = text;
+      ASSERT_EQ(copy, "Kitchen");
+    }
+  });
 }
 
 }  // namespace

@@ -7,9 +7,10 @@
 #include <array>
 #include <set>
 #include <string>
-#include <thread>
 #include <unordered_set>
 #include <vector>
+
+#include "PlatformModel/RunOnThreads.h"
 
 namespace nidus {
 namespace {
@@ -80,13 +81,9 @@ TEST(NDUUIDTest, ThreadsNeverShareRandomOnes) {
   constexpr std::size_t kThreads = 4;
   constexpr std::size_t kEach = 500;
   std::vector<std::vector<NDUUID>> made(kThreads);
-  std::vector<std::thread> threads;
-  for (auto& uuids : made) {
-    threads.emplace_back([&uuids] {
-      for (std::size_t i = 0; i < kEach; ++i) uuids.push_back(NDUUID::random());
-    });
-  }
-  for (std::thread& thread : threads) thread.join();
+  runOnThreads(kThreads, [&made](std::size_t number) {
+    for (std::size_t i = 0; i < kEach; ++i) made[number].push_back(NDUUID::random());
+  });
   std::set<NDUUID> all;
   for (const auto& uuids : made) all.insert(uuids.begin(), uuids.end());
   EXPECT_EQ(all.size(), kThreads * kEach);

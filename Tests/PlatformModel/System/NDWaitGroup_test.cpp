@@ -7,6 +7,7 @@
 #include <thread>
 #include <vector>
 
+#include "PlatformModel/RunOnThreads.h"
 #include "PlatformModel/System/NDConcurrentQueue.h"
 #include "PlatformModel/System/NDDeliveryHold.h"
 #include "PlatformModel/System/NDMainQueue.h"
@@ -130,13 +131,13 @@ TEST(NDWaitGroupThreadsTest, LastLeaveWakesAllWaiters) {
   NDWaitGroup group(std::make_shared<NDSystemClock>());
   group.enter();
   group.enter();
-  std::vector<std::thread> waiters;
-  for (int i = 0; i < 3; ++i) {
-    waiters.emplace_back([&group] { EXPECT_TRUE(group.wait(1h)); });
-  }
-  group.leave();
-  group.leave();
-  for (std::thread& waiter : waiters) waiter.join();
+  runOnThreads(5, [&group](std::size_t number) {
+    if (number < 2) {
+      group.leave();
+    } else {
+      EXPECT_TRUE(group.wait(1h));
+    }
+  });
 }
 
 TEST(NDWaitGroupThreadsTest, WaiterMayDestroyTheGroup) {
