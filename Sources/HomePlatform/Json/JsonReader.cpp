@@ -243,6 +243,7 @@ void readJson(std::string_view text, JsonEvents& events) {
 }
 
 void readJson(std::istream& in, JsonEvents& events) {
+  if (!in) throw JsonError{"", "cannot be read"};
   try {
     readBytes(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>(), events);
   } catch (const std::ios_base::failure& failure) {

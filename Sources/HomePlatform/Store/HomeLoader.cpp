@@ -69,6 +69,7 @@ class HomeLoader {
       elements.push_back(read(row));
       if (owners) rows.emplace_back(row.integer(1), &elements);
     }
+    if (!owners) return;
     std::size_t index = 0;
     const std::vector<Data>* present = nullptr;
     for (const auto& [id, elements] : rows) {

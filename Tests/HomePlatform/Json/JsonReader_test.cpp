@@ -5,6 +5,7 @@
 
 #include <cfloat>
 #include <cmath>
+#include <fstream>
 #include <limits>
 #include <sstream>
 #include <string>
@@ -191,6 +192,28 @@ TEST(ReadJsonTest, FindsTrailingTextInStreams) {
   std::istringstream in("{} x");
   JsonBuilder builder;
   EXPECT_THROW(readJson(in, builder), JsonError);
+}
+
+TEST(ReadJsonTest, SaysWhyAFolderCannotBeRead) {
+  std::ifstream in("/");
+  JsonBuilder builder;
+  try {
+    readJson(in, builder);
+    FAIL() << "was accepted";
+  } catch (const JsonError& error) {
+    EXPECT_EQ(error.message, "cannot be read: Is a directory");
+  }
+}
+
+TEST(ReadJsonTest, SaysWhenAStreamCannotBeRead) {
+  std::ifstream in("/nowhere/home.json");
+  JsonBuilder builder;
+  try {
+    readJson(in, builder);
+    FAIL() << "was accepted";
+  } catch (const JsonError& error) {
+    EXPECT_EQ(error.message, "cannot be read");
+  }
 }
 
 TEST(JsonBuilderTest, RefusesMoreValuesThanAllowed) {
