@@ -28,7 +28,7 @@ struct ValueChange {
 class HomeStore {
  public:
   /// How long a call waits for another process that is changing the database.
-  static constexpr std::chrono::milliseconds kLockTimeout{10'000};
+  static constexpr std::chrono::milliseconds kLockTimeout{30'000};
 
   /// Opens the database in `file`; none opens one in memory. Folder and file are made, for their
   /// owner alone, when they are missing, and an earlier schema is migrated. Fails when the file is
