@@ -107,40 +107,25 @@ TEST_F(DataFolderTest, FailsToChangeALockedDatabase) {
   EXPECT_THAT(exported(), HasSubstr("Cottage"));
 }
 
+TEST_F(DataFolderTest, MayFailWhileTheProgramRuns) {
+  importSmallHome();
+  ProgramProcess process(start({"perform"}));
+  process.write(readCommandLine("Lamp") + "\n");
+  ASSERT_TRUE(process.readLine());
+  Connection(database()).run("DROP TABLE characteristic");
+  process.write(readCommandLine("Lamp") + "\n");
+  ASSERT_TRUE(process.readLine());
+  const ProgramEnd end = process.finish();
+  EXPECT_EQ(end.exitStatus, 4);
+  EXPECT_THAT(end.errors, IsOneFailure(database() + ": "));
+}
+
 TEST_F(DataFolderTest, RefusesABadVocabulary) {
   importSmallHome();
   folder_.write("data/vocabulary.json", R"({"format": "nidus-vocabulary/1", "words": []})");
   const ProgramEnd end = run({"records"});
   EXPECT_NE(end.exitStatus, 0);
   EXPECT_THAT(end.errors, IsOneFailure(data() + "/vocabulary.json: /words: "));
-}
-
-TEST_F(DataFolderTest, NeedsTheModuleBesideTheProgram) {
-  std::filesystem::create_directory(folder_.path() / "bin");
-  std::filesystem::copy_file(NIDUS_PROGRAM, folder_.path() / "bin/nidus");
-  ProgramStart elsewhere = start({"records"});
-  elsewhere.program = folder_.file("bin/nidus");
-  elsewhere.environment = {
-      {"LD_LIBRARY_PATH",
-       (std::filesystem::path(NIDUS_PROGRAM).parent_path().parent_path() / "lib").string()}};
-  const ProgramEnd end = runProgram(elsewhere);
-  EXPECT_EQ(end.exitStatus, 4);
-  EXPECT_THAT(end.errors, IsOneFailure(folder_.file("lib/nidus/NidusAssistant.so") + ": "));
-}
-
-TEST_F(DataFolderTest, RefusesAModuleThatIsNone) {
-  std::filesystem::create_directories(folder_.path() / "bin");
-  std::filesystem::create_directories(folder_.path() / "lib/nidus");
-  std::filesystem::copy_file(NIDUS_PROGRAM, folder_.path() / "bin/nidus");
-  folder_.write("lib/nidus/NidusAssistant.so", "no module");
-  ProgramStart elsewhere = start({"sync"});
-  elsewhere.program = folder_.file("bin/nidus");
-  elsewhere.environment = {
-      {"LD_LIBRARY_PATH",
-       (std::filesystem::path(NIDUS_PROGRAM).parent_path().parent_path() / "lib").string()}};
-  const ProgramEnd end = runProgram(elsewhere);
-  EXPECT_EQ(end.exitStatus, 4);
-  EXPECT_THAT(end.errors, IsOneFailure(folder_.file("lib/nidus/NidusAssistant.so") + ": "));
 }
 
 }  // namespace

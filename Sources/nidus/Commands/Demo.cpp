@@ -102,7 +102,8 @@ ExitStatus demonstrate() {
   if (!session) return report(session.failure());
   Demonstration demonstration(**session);
   if (auto failure = demonstration.run()) return report(*failure);
-  return demonstration.differences() == 0 ? ExitStatus::success : ExitStatus::otherOutcome;
+  return (*session)->statusAfter(demonstration.differences() == 0 ? ExitStatus::success
+                                                                  : ExitStatus::otherOutcome);
 }
 
 }  // namespace

@@ -22,7 +22,7 @@ constexpr const char kStandardInput[] = "standard input";
 /// Performs commands one after the other and keeps the worst of their statuses.
 class Performance {
  public:
-  explicit Performance(CommandRunner& runner) : runner_(runner) {}
+  explicit Performance(Session& session) : session_(session) {}
 
   /// Reads and performs the command in `text`, and prints its replies; `name` stands for the text
   /// in messages.
@@ -33,7 +33,7 @@ class Performance {
   /// Performs the command of each line of `in` that is not blank, before the next line is read.
   void performLines(std::istream& in, const std::string& name) {
     std::string line;
-    for (std::size_t number = 1; canGoOn() && std::getline(in, line); ++number) {
+    for (std::size_t number = 1; !isCutShort_ && std::getline(in, line); ++number) {
       if (!isBlank(line)) perform(line, name + ": line " + std::to_string(number));
     }
     if (in.bad()) {
@@ -48,31 +48,35 @@ class Performance {
   [[nodiscard]] ExitStatus status() const { return status_.value_or(ExitStatus::success); }
 
  private:
-  /// A platform that has failed or an output that nobody takes fails the following commands too.
-  [[nodiscard]] bool canGoOn() const { return status_ != ExitStatus::platformFailed; }
-
   ExitStatus performOne(std::string_view text, const std::string& name) {
     const auto command = readCommand(text, name);
     if (!command) return report(command.failure());
-    const auto replies = runner_.perform(**command);
-    if (!replies) return report(replies.failure());
+    const auto replies = session_.runner().perform(**command);
+    if (!replies) return cutShort(replies.failure());
     if (replies->empty()) {
       reportLine(name + ": the plug-in gave no reply; see what is there with nidus records");
     }
     for (const NDDictionary& reply : *replies) {
-      if (auto failure = writeOutput(jsonLine(reply))) return report(*failure);
+      if (auto failure = writeOutput(jsonLine(reply))) return cutShort(*failure);
     }
-    return statusOf(*replies);
+    return session_.statusAfter(statusOf(*replies));
   }
 
-  CommandRunner& runner_;
+  /// Ends with a failure that the following commands would meet too.
+  ExitStatus cutShort(const Failure& failure) {
+    isCutShort_ = true;
+    return report(failure);
+  }
+
+  Session& session_;
+  bool isCutShort_ = false;
   std::optional<ExitStatus> status_;
 };
 
 ExitStatus performInput(const Settings& settings) {
   const auto session = Session::open(settings);
   if (!session) return report(session.failure());
-  Performance performance((*session)->runner());
+  Performance performance(**session);
   performance.performLines(std::cin, kStandardInput);
   return performance.status();
 }
@@ -84,7 +88,7 @@ ExitStatus performFile(const std::string& file, const Settings& settings) {
   if (!text) return report(text.failure());
   const auto session = Session::open(settings);
   if (!session) return report(session.failure());
-  Performance performance((*session)->runner());
+  Performance performance(**session);
   if (isOneDocument(*text)) {
     performance.perform(*text, file);
   } else {

@@ -17,7 +17,7 @@ ExitStatus printRecords(const Settings& settings) {
     appendJson(lines, record);
     lines += '\n';
   }
-  return printText(lines);
+  return (*session)->statusAfter(printText(lines));
 }
 
 }  // namespace

@@ -38,7 +38,7 @@ ExitStatus synchronise(const Settings& settings) {
     if (change.object) lines += changeLine(change);
   }
   sync.end();
-  return printText(lines);
+  return (*session)->statusAfter(printText(lines));
 }
 
 }  // namespace

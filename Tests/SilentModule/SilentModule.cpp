@@ -1,0 +1,51 @@
+#include <memory>
+
+#include "PlatformModel/Assistant/NDAssistantModule.h"
+
+namespace nidus {
+namespace {
+
+/// Lets go of its handler without a reply.
+class SilentCommand final : public AFServiceCommand {
+ public:
+  void performWithCompletion(VAHAReplyHandler /*handler*/) override {}
+};
+
+/// Never resets and has no entities.
+class SilentSync final : public AFSyncHandler {
+ public:
+  void beginSyncWithAnchor_validity_forKey_beginInfo(
+      const NDString& /*anchor*/, const NDString& /*validity*/, const NDString& /*key*/,
+      std::shared_ptr<AFSyncBeginInfo> /*beginInfo*/) override {}
+  void getChangeAfterAnchor_changeInfo(const NDString& anchor,
+                                       AFSyncChangeInfo& changeInfo) override {
+    changeInfo.setPostAnchor(anchor);
+  }
+  void syncDidEnd() override {}
+};
+
+std::shared_ptr<AFServiceCommand> makeCommand(
+    const VAHACommand& /*request*/, std::shared_ptr<NDAssistantCommandObserver> /*observer*/,
+    std::string& /*message*/) {
+  return std::make_shared<SilentCommand>();
+}
+
+std::shared_ptr<AFSyncHandler> makeSyncHandler(std::string& /*message*/) {
+  return std::make_shared<SilentSync>();
+}
+
+bool gatherRecords(std::function<void(const NDDictionaryList& records)> /*receive*/,
+                   std::string& /*message*/) {
+  return true;
+}
+
+}  // namespace
+}  // namespace nidus
+
+extern "C" ND_EXPORT const nidus::NDAssistantModule* NDAssistantModuleEntry() {
+  static constexpr nidus::NDAssistantModule kModule = {
+      nidus::kNDAssistantModuleInterfaceVersion + NIDUS_INTERFACE_OFFSET,
+      nidus::kNDAssistantModuleABI, nidus::makeCommand, nidus::makeSyncHandler,
+      nidus::gatherRecords};
+  return &kModule;
+}

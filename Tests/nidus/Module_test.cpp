@@ -1,0 +1,89 @@
+#include "nidus/ProgramTest.h"
+
+namespace nidus {
+namespace {
+
+using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+
+/// The program in an installation of the test's own, beside a module that the test chooses.
+class InstalledModuleTest : public ProgramTest {
+ protected:
+  InstalledModuleTest() {
+    std::filesystem::create_directories(folder_.path() / "bin");
+    std::filesystem::create_directories(folder_.path() / "lib/nidus");
+    std::filesystem::copy_file(NIDUS_PROGRAM, program());
+  }
+
+  [[nodiscard]] std::string program() const { return folder_.file("bin/nidus"); }
+  [[nodiscard]] std::string module() const { return folder_.file("lib/nidus/NidusAssistant.so"); }
+  void install(const char* module) const { std::filesystem::copy_file(module, this->module()); }
+  [[nodiscard]] ProgramEnd runInstalled(const std::string& command,
+                                        const std::string& input = "") const {
+    ProgramStart installed = start({command}, input);
+    installed.program = program();
+    installed.environment = {{"LD_LIBRARY_PATH", NIDUS_LIBRARIES}};
+    return runProgram(installed);
+  }
+  void expectModuleFailure(const std::string& reason) const {
+    const ProgramEnd end = runInstalled("records");
+    EXPECT_EQ(end.exitStatus, 4);
+    EXPECT_THAT(end.output, IsEmpty());
+    EXPECT_THAT(end.errors, IsOneFailure(module() + ": " + reason));
+    EXPECT_THAT(end.errors, HasSubstr("; install the program and the module of one release"));
+  }
+};
+
+TEST_F(InstalledModuleTest, MustBeThere) { expectModuleFailure("the plug-in module is not there"); }
+
+TEST_F(InstalledModuleTest, MustBeALibrary) {
+  folder_.write("lib/nidus/NidusAssistant.so", "no library");
+  expectModuleFailure("cannot be opened");
+}
+
+TEST_F(InstalledModuleTest, MustHaveTheInterface) {
+  install(NIDUS_OTHER_INTERFACE_MODULE);
+  expectModuleFailure("offers interface");
+}
+
+TEST_F(InstalledModuleTest, IsNotLookedForInTheWorkingFolder) {
+  const std::filesystem::path old = std::filesystem::current_path();
+  std::filesystem::create_directories(folder_.path() / "work/lib/nidus");
+  std::filesystem::create_directories(folder_.path() / "work/bin");
+  std::filesystem::copy_file(NIDUS_SILENT_MODULE,
+                             folder_.path() / "work/lib/nidus/NidusAssistant.so");
+  std::filesystem::current_path(folder_.path() / "work/bin");
+  expectModuleFailure("the plug-in module is not there");
+  std::filesystem::current_path(old);
+}
+
+TEST_F(InstalledModuleTest, MayGiveNoReply) {
+  install(NIDUS_SILENT_MODULE);
+  const ProgramEnd end = runInstalled("perform", "{}\n");
+  EXPECT_EQ(end.exitStatus, 3);
+  EXPECT_THAT(end.output, IsEmpty());
+  EXPECT_THAT(end.errors, IsOneFailure("standard input: line 1: the plug-in gave no reply"));
+}
+
+TEST_F(InstalledModuleTest, MayNotAnswerASync) {
+  install(NIDUS_SILENT_MODULE);
+  const ProgramEnd end = runInstalled("sync");
+  EXPECT_EQ(end.exitStatus, 3);
+  EXPECT_THAT(end.output, IsEmpty());
+  EXPECT_THAT(end.errors, IsOneFailure("the plug-in did not answer the sync"));
+}
+
+TEST_F(InstalledModuleTest, CountsNoReplyAboveBadInput) {
+  install(NIDUS_SILENT_MODULE);
+  EXPECT_EQ(runInstalled("perform", "x\n{}\nx\n").exitStatus, 3);
+}
+
+TEST_F(InstalledModuleTest, MakesADemonstrationFail) {
+  install(NIDUS_SILENT_MODULE);
+  const ProgramEnd end = runInstalled("demo");
+  EXPECT_EQ(end.exitStatus, 1);
+  EXPECT_THAT(end.errors, HasSubstr("nidus: demo: this differs from what was expected"));
+}
+
+}  // namespace
+}  // namespace nidus
