@@ -29,12 +29,15 @@ if(NIDUS_SANITIZE)
   target_link_options(NidusOptions INTERFACE -fsanitize=${NIDUS_SANITIZE})
 endif()
 
-# nidus_library(NAME STATIC|SHARED|MODULE): a library of all sources and headers of the current
-# folder and those below it. Headers are included as "NAME-OF-FOLDER/Header.h" and stand on their
-# own.
+# nidus_library(NAME STATIC|SHARED [BUT SOURCES...]): a library of all sources and headers of the
+# current folder and those below it, but the sources named. Headers are included as
+# "NAME-OF-FOLDER/Header.h" and stand on their own.
 function(nidus_library name kind)
   file(GLOB_RECURSE sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
   file(GLOB_RECURSE headers CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.h)
+  cmake_parse_arguments(PARSE_ARGV 2 library "" "" BUT)
+  list(TRANSFORM library_BUT PREPEND ${CMAKE_CURRENT_SOURCE_DIR}/)
+  list(REMOVE_ITEM sources ${library_BUT})
   add_library(${name} ${kind} ${sources})
   target_sources(${name} PUBLIC FILE_SET HEADERS
     BASE_DIRS ${PROJECT_SOURCE_DIR}/Sources FILES ${headers})

@@ -1,0 +1,276 @@
+#include "Assistant/NDAssistantSyncHome.h"
+
+#include <algorithm>
+#include <atomic>
+#include <chrono>
+#include <cstdio>
+#include <cstdlib>
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include "Assistant/Entities.h"
+#include "Logging/WLOLog.h"
+#include "PlatformModel/Assistant/VAHAConstants.h"
+#include "PlatformModel/NDPlatform.h"
+#include "PlatformModel/System/NDDeliveryHold.h"
+#include "PlatformModel/System/NDSerialQueue.h"
+
+namespace nidus {
+
+/// What belongs to one sync alone.
+struct NDAssistantSyncHome::Sync {
+  std::shared_ptr<NDWaitGroup> group;
+  std::shared_ptr<NDAssistantGather> gather;  ///< Null when no homes are configured.
+  std::atomic<bool> done = false;
+
+  /// Lets the waiting caller go, unless that has been done. Called on the serial queue.
+  bool release() {
+    if (done) return false;
+    group->leave();
+    done = true;
+    return true;
+  }
+};
+
+namespace {
+
+constexpr std::string_view kSyncKey = "com.corvane.nidus.name";
+constexpr std::chrono::seconds kLongestWait(2);
+constexpr std::uint32_t kFinalAnchor = 0xCAFEBABE;
+
+/// Stops the process. Hosts look for operation, file and line, which therefore stay what they are
+/// when the code moves.
+[[noreturn]] void failAssertion(const char* operation, int line, const char* condition) {
+  std::fprintf(stderr, "*** Assertion failure in %s, %s:%d: %s\n", operation,
+               "Sources/Assistant/NDAssistantSyncHome", line, condition);
+  std::abort();
+}
+
+bool isPublished(const HomeObjectRecord& record) {
+  if (record.objectType == VAHAEntityTypeTRIGGERValue) return false;
+  return record.objectType != VAHAEntityTypeSERVICEValue || record.objectName;
+}
+
+std::size_t countOf(const auto& list) { return list ? list->size() : 0; }
+
+std::shared_ptr<NDWaitGroup> makeGroup(NDPlatform& platform) {
+  return std::make_shared<NDWaitGroup>(platform.clock());
+}
+
+void logAtInfo(const char* text) {
+  if (WLOShouldLogAtLevel(6)) WLOLog(6, text, {});
+}
+
+}  // namespace
+
+std::shared_ptr<NDAssistantSyncHome> NDAssistantSyncHome::init() {
+  const auto platform = NDPlatform::registered();
+  if (!platform) return nullptr;
+  return std::make_shared<NDAssistantSyncHome>(
+      Passkey(), std::make_shared<NDSerialQueue>("NDAssistant", platform->sharedQueue()),
+      makeGroup(*platform));
+}
+
+NDAssistantSyncHome::NDAssistantSyncHome(Passkey /*passkey*/, std::shared_ptr<NDQueue> queue,
+                                         std::shared_ptr<NDWaitGroup> group)
+    : sync_(std::make_shared<Sync>()), queue_(std::move(queue)) {
+  sync_->group = std::move(group);
+}
+
+NDAssistantSyncHome::~NDAssistantSyncHome() { NDAssistantSyncHome::syncDidEnd(); }
+
+void NDAssistantSyncHome::beginSyncWithAnchor_validity_forKey_beginInfo(
+    const NDString& /*anchor*/, const NDString& /*validity*/, const NDString& key,
+    std::shared_ptr<AFSyncBeginInfo> beginInfo) {
+  if (key != kSyncKey) {
+    failAssertion("-[NDAssistantSyncHome beginSyncWithAnchor:validity:forKey:beginInfo:]", 80,
+                  "[key isEqualToString:@\"com.corvane.nidus.name\"]");
+  }
+  syncDidEnd();
+  const NDDeliveryHold hold;
+  const auto sync = startSync();
+  if (!sync->gather) {
+    logAtInfo("No homes configured - short-circuiting sync");
+    beginInfo->resetWithValidity(nullptr);
+    return;
+  }
+  sync->group->enter();
+  gatherForSync(sync, std::move(beginInfo));
+  if (!sync->group->wait(kLongestWait)) logAtInfo("Timed out waiting for nidusd");
+  queue()->async([self = shared_from_this(), sync] { self->watch(*sync); });
+}
+
+/// Replaces the sync that went before, whose gatherer goes with it.
+std::shared_ptr<NDAssistantSyncHome::Sync> NDAssistantSyncHome::startSync() {
+  auto sync = std::make_shared<Sync>();
+  if (const auto platform = NDPlatform::registered()) sync->group = makeGroup(*platform);
+  sync->gather = NDAssistantGather::init();
+  auto former = sync;
+  {
+    const NDLock lock(mutex_);
+    sync_.swap(former);
+  }
+  return sync;
+}
+
+void NDAssistantSyncHome::gatherForSync(const std::shared_ptr<Sync>& sync,
+                                        std::shared_ptr<AFSyncBeginInfo> beginInfo) {
+  // Weak, both: the handler owns the sync, the sync the gatherer, and the gatherer this callback.
+  sync->gather->startWithCompletionHandler([weakSelf = weak_from_this(),
+                                            weakSync = std::weak_ptr(sync),
+                                            beginInfo = std::move(beginInfo)](long /*count*/) {
+    const auto self = weakSelf.lock();
+    const auto gathered = weakSync.lock();
+    if (!self || !gathered) return;
+    self->queue()->async([self, gathered, beginInfo] { self->build(*gathered, *beginInfo); });
+  });
+}
+
+/// The build task. A late one still publishes and resets: the snapshot is good, only the caller
+/// could not wait for it.
+void NDAssistantSyncHome::build(Sync& sync, AFSyncBeginInfo& beginInfo) {
+  Entities entities;
+  for (const HomeObjectRecord& record : sync.gather->gatherNidusObjects()) {
+    if (isPublished(record)) entities.push_back(entityFromObject(record));
+  }
+  Anchors anchors;
+  anchors.reserve(entities.size());
+  for (std::size_t i = 1; i < entities.size(); ++i) anchors.emplace_back(std::to_string(i));
+  NDString finalAnchor;
+  if (!entities.empty()) {
+    finalAnchor = calculateFinalAnchorForHomeObjects(entities);
+    anchors.push_back(finalAnchor);
+  }
+  publish(sync, finalAnchor, std::move(anchors), std::move(entities));
+  beginInfo.resetWithValidity(finalAnchor);
+  sync.release();
+}
+
+/// Sets the lists together, unless the next sync has begun: they are its by then.
+void NDAssistantSyncHome::publish(const Sync& sync, const NDString& finalAnchor, Anchors anchors,
+                                  Entities entities) {
+  const NDLock lock(mutex_);
+  if (sync_.get() != &sync) return;
+  finalAnchor_ = finalAnchor;
+  postAnchors_ = std::move(anchors);
+  entities_ = std::move(entities);
+}
+
+void NDAssistantSyncHome::watch(Sync& sync) {
+  if (sync.done) return;
+  logAtInfo("nidusd did not respond");
+  sync.release();
+}
+
+void NDAssistantSyncHome::getChangeAfterAnchor_changeInfo(const NDString& anchor,
+                                                          AFSyncChangeInfo& changeInfo) {
+  std::shared_ptr<const VAHAEntity> entity;
+  NDString postAnchor = anchor;
+  {
+    const NDLock lock(mutex_);
+    const std::size_t count = countOf(entities_);
+    if (countOf(postAnchors_) != count) {
+      failAssertion("-[NDAssistantSyncHome getChangeAfterAnchor:changeInfo:]", 173,
+                    "_postAnchors.count == _entities.count");
+    }
+    std::size_t index = 0;
+    if (anchor && count > 0) {
+      const auto found = std::find(postAnchors_->begin(), postAnchors_->end(), anchor);
+      index = static_cast<std::size_t>(found - postAnchors_->begin()) + 1;
+    }
+    if (index < count && !(anchor && anchor == finalAnchor_)) {
+      entity = (*entities_)[index];
+      postAnchor = (*postAnchors_)[index];
+    }
+  }
+  changeInfo.setObject(std::move(entity));
+  changeInfo.setPostAnchor(postAnchor);
+}
+
+void NDAssistantSyncHome::syncDidEnd() {
+  // Together, so that a late build task comes before or after all of them.
+  const NDLock lock(mutex_);
+  finalAnchor_ = nullptr;
+  postAnchors_.reset();
+  entities_.reset();
+}
+
+NDString NDAssistantSyncHome::calculateFinalAnchorForHomeObjects(
+    const Entities& /*entities*/) const {
+  return std::to_string(kFinalAnchor);
+}
+
+bool NDAssistantSyncHome::done() const {
+  const NDLock lock(mutex_);
+  return sync_->done;
+}
+void NDAssistantSyncHome::setDone(bool done) {
+  const NDLock lock(mutex_);
+  sync_->done = done;
+}
+
+NDString NDAssistantSyncHome::finalAnchor() const {
+  const NDLock lock(mutex_);
+  return finalAnchor_;
+}
+void NDAssistantSyncHome::setFinalAnchor(NDString anchor) {
+  const NDLock lock(mutex_);
+  finalAnchor_ = std::move(anchor);
+}
+
+std::optional<NDAssistantSyncHome::Anchors> NDAssistantSyncHome::postAnchors() const {
+  const NDLock lock(mutex_);
+  return postAnchors_;
+}
+void NDAssistantSyncHome::setPostAnchors(std::optional<Anchors> anchors) {
+  const NDLock lock(mutex_);
+  postAnchors_ = std::move(anchors);
+}
+
+std::optional<NDAssistantSyncHome::Entities> NDAssistantSyncHome::entities() const {
+  const NDLock lock(mutex_);
+  return entities_;
+}
+void NDAssistantSyncHome::setEntities(std::optional<Entities> entities) {
+  const NDLock lock(mutex_);
+  entities_ = std::move(entities);
+}
+
+std::shared_ptr<NDWaitGroup> NDAssistantSyncHome::group() const {
+  const NDLock lock(mutex_);
+  return sync_->group;
+}
+void NDAssistantSyncHome::setGroup(std::shared_ptr<NDWaitGroup> group) {
+  const NDLock lock(mutex_);
+  sync_->group = std::move(group);
+}
+
+std::shared_ptr<NDAssistantGather> NDAssistantSyncHome::gather() const {
+  const NDLock lock(mutex_);
+  return sync_->gather;
+}
+void NDAssistantSyncHome::setGather(std::shared_ptr<NDAssistantGather> gather) {
+  const NDLock lock(mutex_);
+  sync_->gather = std::move(gather);
+}
+
+std::shared_ptr<NDQueue> NDAssistantSyncHome::queue() const {
+  const NDLock lock(mutex_);
+  return queue_;
+}
+void NDAssistantSyncHome::setQueue(std::shared_ptr<NDQueue> queue) {
+  const NDLock lock(mutex_);
+  queue_ = std::move(queue);
+}
+
+std::shared_ptr<NDHomeManager> NDAssistantSyncHome::manager() const {
+  const NDLock lock(mutex_);
+  return manager_;
+}
+void NDAssistantSyncHome::setManager(std::shared_ptr<NDHomeManager> manager) {
+  const NDLock lock(mutex_);
+  manager_ = std::move(manager);
+}
+
+}  // namespace nidus
