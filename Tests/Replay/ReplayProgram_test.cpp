@@ -58,7 +58,6 @@ std::vector<BadScenario> badScenarios() {
       {"OtherFormat", R"({"format": "nidus-scenario/2", )" + home + R"(, "steps": []})"},
       {"HomeDocumentAsScenario", kHome},
       {"NoHome", start + R"("steps": []})"},
-      {"HomeFileMissing", start + R"("homeFile": "nowhere.json", "steps": []})"},
       {"HomeOfAnotherType", start + R"("home": [], "steps": []})"},
       {"HomeOfAnotherFormat",
        start + R"("home": {"format": "nidus-home/9", "homes": []}, "steps": []})"},
@@ -121,6 +120,15 @@ TEST(ReplayProgramTest, RefusesAFileThatIsNotThere) {
   EXPECT_EQ(run.exitStatus, 2);
   EXPECT_THAT(run.output, IsEmpty());
   EXPECT_THAT(run.errors, HasSubstr("nowhere.json"));
+}
+
+TEST(ReplayProgramTest, NamesTheHomeFileThatIsNotThere) {
+  const ScratchFolder folder;
+  const ReplayRun run = runReplay(folder.write(
+      "scenario.json", R"({"format": "nidus-scenario/1", "homeFile": "away.json", "steps": []})"));
+  EXPECT_EQ(run.exitStatus, 2);
+  EXPECT_THAT(run.output, IsEmpty());
+  EXPECT_THAT(run.errors, HasSubstr((folder.path() / "away.json").string()));
 }
 
 TEST(ReplayProgramTest, FindsTheHomeFileBesideTheScenario) {
