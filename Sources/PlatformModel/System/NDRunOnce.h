@@ -6,8 +6,9 @@
 
 namespace nidus {
 
-/// Runs a piece of work once, whoever asks first; the others wait for its end. Constant-initialised,
-/// so a static one runs no code when it is loaded. May be used from any thread.
+/// Runs a piece of work once, whoever asks first; the others wait for its end.
+/// Constant-initialised, so a static one runs no code when it is loaded. May be used from any
+/// thread.
 class NDRunOnce {
  public:
   constexpr NDRunOnce() noexcept = default;
