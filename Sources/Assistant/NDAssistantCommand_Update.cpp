@@ -1,3 +1,5 @@
+#include <compare>
+
 #include "Assistant/ActionRun.h"
 #include "Assistant/HomeTable.h"
 #include "Assistant/NDAssistantCommand.h"
@@ -31,6 +33,13 @@ bool suits(const NDString& actionType, const NDString& valueType) {
   return true;
 }
 
+void logUnsuitable(const NDString& actionType, const NDString& valueType) {
+  if (!WLOShouldLogAtLevel(3)) return;
+  WLOLog(3, "%s ### Vela passed an incorrect action (%@) to a %@ value type.",
+         {"-[NDAssistantCommand handleUpdateActionTypes:serviceType:forObjects:completionHandler:]",
+          actionType, valueType});
+}
+
 float stepOf(const VAHAAction& action) {
   const VAHAValue* value = action.value().get();
   if (const auto* integer = dynamic_cast<const VAHAIntegerValue*>(value)) {
@@ -51,8 +60,8 @@ NDValueRef clamped(NDValueRef value,
                    const std::shared_ptr<const NDCharacteristicMetadata>& limits) {
   const NDValueRef& maximum = property(limits, &NDCharacteristicMetadata::maximumValue);
   const NDValueRef& minimum = property(limits, &NDCharacteristicMetadata::minimumValue);
-  if (maximum && maximum->compare(value) < 0) value = maximum;
-  if (minimum && minimum->compare(value) > 0) value = minimum;
+  if (maximum && std::is_lt(maximum->compare(value))) value = maximum;
+  if (minimum && std::is_gt(minimum->compare(value))) value = minimum;
   return value;
 }
 
@@ -187,12 +196,7 @@ void NDAssistantCommand::handleUpdateActionTypes_serviceType_forObjects_completi
   const NDString valueType =
       property(metadata_, &NDNAPMetadata::mapCharacteristicValueType, attribute);
   if (!suits(actionType, valueType)) {
-    if (WLOShouldLogAtLevel(3)) {
-      WLOLog(3, "%s ### Vela passed an incorrect action (%@) to a %@ value type.",
-             {"-[NDAssistantCommand "
-              "handleUpdateActionTypes:serviceType:forObjects:completionHandler:]",
-              actionType, valueType});
-    }
+    logUnsuitable(actionType, valueType);
     reportOutcome_results_handler(VAHACommandOutcomeCOMMAND_FAILUREValue, std::nullopt, handler);
     return;
   }

@@ -1,4 +1,4 @@
-#include <algorithm>
+#include <compare>
 #include <unordered_map>
 
 #include "Assistant/ActionRun.h"
@@ -50,8 +50,8 @@ NDValueRef clamped(const NDValueRef& value,
   const NDValueRef& maximum = property(limits, &NDCharacteristicMetadata::maximumValue);
   const NDValueRef& minimum = property(limits, &NDCharacteristicMetadata::minimumValue);
   NDValueRef decided = value;
-  if (maximum && maximum->compare(value) < 0) decided = maximum;
-  if (minimum && minimum->compare(value) > 0) decided = minimum;
+  if (maximum && std::is_lt(maximum->compare(value))) decided = maximum;
+  if (minimum && std::is_gt(minimum->compare(value))) decided = minimum;
   return decided;
 }
 
@@ -69,6 +69,22 @@ void decide(WriteTable& table, const std::shared_ptr<NDCharacteristic>& characte
   const NDValueRef& limit = property(limits, toMaximum ? &NDCharacteristicMetadata::maximumValue
                                                        : &NDCharacteristicMetadata::minimumValue);
   if (limit) table.decide(characteristic, limit);
+}
+
+/// Decides about each characteristic. What is read-only gets its result now and never reaches the
+/// platform.
+WriteTable decideWrites(const ActionRun& run,
+                        const NDAssistantCommand::CharacteristicList& characteristics,
+                        const NDValueRef& setValue) {
+  WriteTable table;
+  for (const auto& characteristic : characteristics) {
+    if (isWritable(*characteristic)) {
+      decide(table, characteristic, run.action()->actionType(), setValue);
+    } else {
+      run.addResult(VAHAActionOutcomeREAD_ONLYValue, characteristic->service());
+    }
+  }
+  return table;
 }
 
 /// Makes the results of a batch; false when an accessory requires the device to be unlocked, which
@@ -140,15 +156,7 @@ void NDAssistantCommand::handleSetActionTypes_serviceType_forObjects_completionH
       adjustSetValue(getValueOfType(valueType, action), valueType,
                      property(action->value(), &VAHAValue::units), attribute);
   const auto run = std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler);
-  WriteTable writes;
-  for (const auto& characteristic : characteristics) {
-    if (isWritable(*characteristic)) {
-      decide(writes, characteristic, action->actionType(), setValue);
-    } else {
-      run->addResult(VAHAActionOutcomeREAD_ONLYValue, characteristic->service());
-    }
-  }
-  writeByHome(run, writes, setValue);
+  writeByHome(run, decideWrites(*run, characteristics, setValue), setValue);
 }
 
 }  // namespace nidus

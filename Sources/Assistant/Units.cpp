@@ -56,7 +56,7 @@ NDValueRef adjustSetValue(const NDValueRef& value, const NDString& /*valueType*/
     return property(mapper, &NDNAPMetadata::mapFromAssistantCharacteristicValue_name, value, name);
   }
   if (!(name == VAHAAttributeTEMPERATUREValue) || !speaksFahrenheit(units)) return value;
-  const auto adjusted =
+  NDValueRef adjusted =
       NDValue::floating(fahrenheitToCelsius(property(value, &NDValue::floatValue)));
   if (WLOShouldLogAtLevel(6)) {
     WLOLog(6, "adjustSet: Attribute %@ value %@  locale-adjusted to %@", {name, value, adjusted});
@@ -73,7 +73,7 @@ NDValueRef adjustGetValue(const NDValueRef& value, const NDString& /*valueType*/
     return property(mapper, &NDNAPMetadata::mapToAssistantCharacteristicValue_name, value, name);
   }
   if (!speaksFahrenheit(units)) return value;
-  const auto adjusted =
+  NDValueRef adjusted =
       NDValue::floating(celsiusToFahrenheit(property(value, &NDValue::floatValue)));
   if (WLOShouldLogAtLevel(6)) {
     WLOLog(6, "adjustGet: Characteristic %@ value %@  locale-adjusted to %@",

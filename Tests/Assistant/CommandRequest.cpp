@@ -101,6 +101,7 @@ std::shared_ptr<NDAssistantCommand> makeCommand(
     std::shared_ptr<NDAssistantCommandObserver> observer) {
   Request request;
   std::vector<VAHAActionRef> made;
+  made.reserve(actions.size());
   for (const Action& action : actions) made.push_back(makeAction(action));
   request.setFilter(std::move(filter));
   request.setActions(std::move(made));

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "Assistant/CommandTest.h"
+#include "PlatformModel/NDPlatform.h"
 #include "Support/TestTypes.h"
 
 namespace nidus {
@@ -218,6 +219,19 @@ TEST_F(GetTest, LetsGoOfTheHandlerAfterEachReply) {
   EXPECT_TRUE(isHandlerReleased());
   home->characteristic("Bulb", kPower)->failReads(kNDErrorMustUnlock);
   get("POWER");
+  EXPECT_TRUE(isHandlerReleased());
+}
+
+TEST_F(GetTest, LetsGoOfTheHandlerOnceThePlatformIsGone) {
+  const auto home = useHome(HomeBuilder("Cottage").light("Lamp"));
+  home->holdAnswers();
+  const auto command = performed(makeCommand(nullptr, {}));
+  NDPlatform::unregisterPlatform(NDPlatform::registered());
+  command->handleGetActionTypes_serviceType_forObjects_completionHandler(
+      makeAction({.type = "GET", .attribute = "POWER"}), nullptr, command->allObjects(), handler());
+  home->releaseAnswers();
+  runUntilIdle();
+  EXPECT_THAT(replies(), IsEmpty());
   EXPECT_TRUE(isHandlerReleased());
 }
 

@@ -52,6 +52,18 @@ TEST_F(PerformTest, FindsNoMatchInNoHomes) {
   EXPECT_TRUE(isHandlerReleased());
 }
 
+TEST_F(PerformTest, FindsNoMatchInEmptySnapshot) {
+  silencePlatform();
+  const auto command = makeCommand(Search(), {{.type = "GET"}});
+  command->performWithCompletion(handler());
+  // The homes that were counted are gone by the time they are gathered.
+  useHome(HomeBuilder("Cottage").light("Lamp"));
+  command->gather()->homeManagerDidUpdateHomes(NDHomeManager::create());
+  EXPECT_EQ(command->numberOfHomes(), 1);
+  EXPECT_THAT(replies(), ElementsAre(kNoMatch));
+  EXPECT_THAT(log(), IsEmpty());
+}
+
 TEST_F(PerformTest, KeepsWhatItHasGathered) {
   useHomes({HomeBuilder("Flat").build(), HomeBuilder("Cottage").primary().light("Lamp").build()});
   const auto command = performed(makeCommand(Search(), {}));
