@@ -85,7 +85,7 @@ void NDAssistantSyncHome::beginSyncWithAnchor_validity_forKey_beginInfo(
     std::shared_ptr<AFSyncBeginInfo> beginInfo) {
   if (key != kSyncKey) {
     failAssertion("-[NDAssistantSyncHome beginSyncWithAnchor:validity:forKey:beginInfo:]", 80,
-                  "[key isEqualToString:@\"com.corvane.nidus.name\"]");
+                  "key == \"com.corvane.nidus.name\"");
   }
   syncDidEnd();
   const NDDeliveryHold hold;
