@@ -24,7 +24,7 @@ CharacteristicData characteristic(std::int64_t instanceID, const char* type, con
   characteristic.characteristicType = std::string("com.corvane.nidus.characteristic.") + type;
   characteristic.properties = {"readable", "writable"};
   characteristic.value = characteristic.deviceValue = std::move(value);
-  characteristic.metadata = MetadataData{.format = format};
+  characteristic.metadata.emplace().format = format;
   return characteristic;
 }
 

@@ -32,7 +32,7 @@ CharacteristicData power() {
   power.characteristicType = "com.corvane.nidus.characteristic.power";
   power.properties = {"readable", "writable"};
   power.value = power.deviceValue = NDValue::boolean(false);
-  power.metadata = MetadataData{.format = "bool"};
+  power.metadata.emplace().format = "bool";
   return power;
 }
 
@@ -42,10 +42,11 @@ CharacteristicData brightness() {
   brightness.characteristicType = "com.corvane.nidus.characteristic.brightness";
   brightness.properties = {"readable", "writable"};
   brightness.value = brightness.deviceValue = NDValue::integer(40);
-  brightness.metadata = MetadataData{.format = "int",
-                                     .units = "percentage",
-                                     .minimumValue = NDValue::integer(0),
-                                     .maximumValue = NDValue::integer(100)};
+  MetadataData& metadata = brightness.metadata.emplace();
+  metadata.format = "int";
+  metadata.units = "percentage";
+  metadata.minimumValue = NDValue::integer(0);
+  metadata.maximumValue = NDValue::integer(100);
   return brightness;
 }
 

@@ -1,12 +1,14 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <array>
 #include <atomic>
 #include <cstdlib>
 #include <functional>
 #include <future>
 #include <map>
 #include <mutex>
+#include <set>
 #include <thread>
 
 #include "Assistant/NDAssistantCommand.h"
@@ -247,18 +249,18 @@ class ChangeInfo final : public AFSyncChangeInfo {
 
 /// Performs one sync; the number of entities pulled, or none unless it was reset exactly once.
 std::optional<std::size_t> syncOnce() {
-  NDAssistantSyncHome sync;
+  const auto sync = NDAssistantSyncHome::init();
   auto begin = std::make_shared<BeginInfo>();
-  sync.beginSyncWithAnchor_validity_forKey_beginInfo(nullptr, nullptr, "com.corvane.nidus.name",
-                                                     begin);
+  sync->beginSyncWithAnchor_validity_forKey_beginInfo(nullptr, nullptr, "com.corvane.nidus.name",
+                                                      begin);
   if (begin->resets() != std::vector<NDString>{NDString("3405691582")}) return std::nullopt;
   std::size_t entities = 0;
   ChangeInfo change;
   for (NDString anchor;; anchor = change.anchor(), ++entities) {
-    sync.getChangeAfterAnchor_changeInfo(anchor, change);
+    sync->getChangeAfterAnchor_changeInfo(anchor, change);
     if (change.isEnd()) break;
   }
-  sync.syncDidEnd();
+  sync->syncDidEnd();
   return entities;
 }
 
