@@ -25,7 +25,7 @@ struct StepEvents {
   NDDictionaryList log;
 };
 
-HomePlatformOptions optionsOf(const Scenario& scenario, std::shared_ptr<StepEvents> events) {
+HomePlatformOptions optionsOf(const Scenario& scenario, const std::shared_ptr<StepEvents>& events) {
   HomePlatformOptions options;
   options.locked = scenario.locked;
   options.drainsOnCaller = true;

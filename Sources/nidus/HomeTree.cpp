@@ -32,6 +32,7 @@ std::string joined(const std::vector<std::string>& parts) {
 template <class Object>
 std::string namesOf(const std::vector<Object>& objects) {
   std::vector<std::string> names;
+  names.reserve(objects.size());
   for (const Object& object : objects) names.push_back(object.name.str());
   return joined(names);
 }
