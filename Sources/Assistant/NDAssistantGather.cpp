@@ -160,16 +160,17 @@ void NDAssistantGather::startWithCompletionHandler(CompletionHandler handler) {
     }
   }
   handler(0);
-  takeCompletionHandler();
 }
 
 void NDAssistantGather::homeManagerDidUpdateHomes(const std::shared_ptr<NDHomeManager>& manager) {
+  CompletionHandler handler;
   {
     const NDLock lock(mutex_);
     if (fetchComplete_) return;
+    // Together, so that a start at the same time is either called with this count or with 0.
     fetchComplete_ = true;
+    handler.swap(completionHandler_);
   }
-  const CompletionHandler handler = takeCompletionHandler();
   if (handler) handler(static_cast<long>(manager->homes().size()));
 }
 
@@ -179,13 +180,6 @@ void NDAssistantGather::homeManagerWillNotUpdateHomes(
   const NDLock lock(mutex_);
   isAbandoned_ = true;
   dropped.swap(completionHandler_);
-}
-
-NDAssistantGather::CompletionHandler NDAssistantGather::takeCompletionHandler() {
-  CompletionHandler handler;
-  const NDLock lock(mutex_);
-  handler.swap(completionHandler_);
-  return handler;
 }
 
 NDString NDAssistantGather::getPrimaryHomeName() const {

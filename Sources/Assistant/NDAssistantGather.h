@@ -65,8 +65,6 @@ class NDAssistantGather final : public NDHomeManagerDelegate {
   void addToList_service(HomeObjectRecords& list, const std::shared_ptr<NDService>& service) const;
 
  private:
-  CompletionHandler takeCompletionHandler();
-
   const std::shared_ptr<NDHomeManager> manager_;
   mutable NDMutex mutex_;
   bool fetchComplete_ ND_GUARDED_BY(mutex_) = false;

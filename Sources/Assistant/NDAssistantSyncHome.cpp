@@ -20,16 +20,19 @@ namespace nidus {
 
 /// What belongs to one sync alone.
 struct NDAssistantSyncHome::Sync {
+  explicit Sync(const std::shared_ptr<NDClock>& clock)
+      : group(std::make_shared<NDWaitGroup>(clock)) {}
+
   std::shared_ptr<NDWaitGroup> group;
   std::shared_ptr<NDAssistantGather> gather;  ///< Null when no homes are configured.
   std::atomic<bool> done = false;
 
   /// Lets the waiting caller go, unless that has been done. Called on the serial queue.
-  bool release() {
-    if (done) return false;
-    group->leave();
+  void release() {
+    if (done) return;
+    // Before the leave, so that whoever has waited finds it set.
     done = true;
-    return true;
+    group->leave();
   }
 };
 
@@ -54,10 +57,6 @@ bool isPublished(const HomeObjectRecord& record) {
 
 std::size_t countOf(const auto& list) { return list ? list->size() : 0; }
 
-std::shared_ptr<NDWaitGroup> makeGroup(NDPlatform& platform) {
-  return std::make_shared<NDWaitGroup>(platform.clock());
-}
-
 void logAtInfo(const char* text) {
   if (WLOShouldLogAtLevel(6)) WLOLog(6, text, {});
 }
@@ -69,14 +68,12 @@ std::shared_ptr<NDAssistantSyncHome> NDAssistantSyncHome::init() {
   if (!platform) return nullptr;
   return std::make_shared<NDAssistantSyncHome>(
       Passkey(), std::make_shared<NDSerialQueue>("NDAssistant", platform->sharedQueue()),
-      makeGroup(*platform));
+      platform->clock());
 }
 
 NDAssistantSyncHome::NDAssistantSyncHome(Passkey /*passkey*/, std::shared_ptr<NDQueue> queue,
-                                         std::shared_ptr<NDWaitGroup> group)
-    : sync_(std::make_shared<Sync>()), queue_(std::move(queue)) {
-  sync_->group = std::move(group);
-}
+                                         std::shared_ptr<NDClock> clock)
+    : clock_(std::move(clock)), sync_(std::make_shared<Sync>(clock_)), queue_(std::move(queue)) {}
 
 NDAssistantSyncHome::~NDAssistantSyncHome() { NDAssistantSyncHome::syncDidEnd(); }
 
@@ -103,8 +100,7 @@ void NDAssistantSyncHome::beginSyncWithAnchor_validity_forKey_beginInfo(
 
 /// Replaces the sync that went before, whose gatherer goes with it.
 std::shared_ptr<NDAssistantSyncHome::Sync> NDAssistantSyncHome::startSync() {
-  auto sync = std::make_shared<Sync>();
-  if (const auto platform = NDPlatform::registered()) sync->group = makeGroup(*platform);
+  auto sync = std::make_shared<Sync>(clock_);
   sync->gather = NDAssistantGather::init();
   auto former = sync;
   {

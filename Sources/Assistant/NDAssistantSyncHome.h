@@ -7,6 +7,7 @@
 #include "Assistant/NDAssistantGather.h"
 #include "PlatformModel/Assistant/AFSyncHandler.h"
 #include "PlatformModel/Home/NDHomeManager.h"
+#include "PlatformModel/System/NDClock.h"
 #include "PlatformModel/System/NDMutex.h"
 #include "PlatformModel/System/NDQueue.h"
 #include "PlatformModel/System/NDString.h"
@@ -39,7 +40,7 @@ class NDAssistantSyncHome final : public AFSyncHandler,
   [[nodiscard]] static std::shared_ptr<NDAssistantSyncHome> init();
   /// For `init` alone.
   NDAssistantSyncHome(Passkey passkey, std::shared_ptr<NDQueue> queue,
-                      std::shared_ptr<NDWaitGroup> group);
+                      std::shared_ptr<NDClock> clock);
   ~NDAssistantSyncHome() override;
 
   /// Opens a sync; `anchor` and `validity` are not consulted, each sync is a full reset. Any key
@@ -91,6 +92,7 @@ class NDAssistantSyncHome final : public AFSyncHandler,
   void publish(const Sync& sync, const NDString& finalAnchor, Anchors anchors, Entities entities);
   void watch(Sync& sync);
 
+  const std::shared_ptr<NDClock> clock_;
   mutable NDMutex mutex_;
   std::shared_ptr<Sync> sync_ ND_GUARDED_BY(mutex_);
   NDString finalAnchor_ ND_GUARDED_BY(mutex_);

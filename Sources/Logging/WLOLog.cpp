@@ -1,7 +1,9 @@
 #include "Logging/WLOLog.h"
 
+#include <algorithm>
 #include <array>
 #include <atomic>
+#include <limits>
 #include <memory>
 
 #include "PlatformModel/NDPlatform.h"
@@ -21,6 +23,7 @@ constexpr const char* kDeveloperLevelKey = "NidusDeveloperLogLevel";
 constexpr const char* kPreferencesDidChange = "com.corvane.managedconfiguration.defaultsdidchange";
 constexpr std::int64_t kLeastLevelTakenAsItIs = 3;
 constexpr std::int64_t kGreatestDeveloperLevel = 7;
+constexpr std::int64_t kGreatestLevel = std::numeric_limits<std::int32_t>::max();
 constexpr std::int64_t kInternalFloor = 6;
 constexpr std::int64_t kCustomerFloor = 4;
 
@@ -43,7 +46,7 @@ void askForInternalBuild(NDPlatform& platform) {
 
 std::int64_t levelFromPreferences(NDPreferences& preferences) {
   const std::int64_t level = preferences.integerForKey(kWLOLogLevelKey);
-  if (level >= kLeastLevelTakenAsItIs) return level;
+  if (level >= kLeastLevelTakenAsItIs) return std::min(level, kGreatestLevel);
   const std::int64_t floor = isInternalBuild ? kInternalFloor : kCustomerFloor;
   const std::int64_t developerLevel = preferences.integerForKey(kDeveloperLevelKey);
   const bool isInRange = developerLevel >= floor && developerLevel <= kGreatestDeveloperLevel;
