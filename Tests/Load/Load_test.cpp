@@ -23,7 +23,7 @@ namespace {
 #if defined(__SANITIZE_THREAD__) || defined(__SANITIZE_ADDRESS__)
 constexpr std::size_t kCommands = 4'000;
 #else
-constexpr std::size_t kCommands = 20'000;
+constexpr std::size_t kCommands = 100'000;
 #endif
 constexpr std::size_t kThreads = 8;
 constexpr std::size_t kCommandsPerSync = 50;
