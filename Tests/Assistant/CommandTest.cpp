@@ -4,13 +4,13 @@
 #include <cstdlib>
 #include <utility>
 
-#include "Assistant/CommandPlatform.h"
 #include "PlatformModel/System/NDMutex.h"
+#include "Support/TestPlatform.h"
 
 namespace nidus {
 namespace {
 
-CommandPlatform& platform() { return *CommandPlatform::shared(); }
+TestPlatform& platform() { return *TestPlatform::shared(); }
 
 /// The list under `key` of a reply; empty when there is none.
 NDDictionaryList listAt(const NDDictionary& reply, std::string_view key) {
@@ -41,7 +41,7 @@ struct CommandTest::State {
 };
 
 CommandTest::CommandTest() : state_(std::make_unique<State>()) {
-  EXPECT_EQ(NDPlatform::registerPlatform(CommandPlatform::shared()), "");
+  EXPECT_EQ(NDPlatform::registerPlatform(TestPlatform::shared()), "");
   platform().setHomes({});
   platform().setSilent(false);
   configureHomes(true);
@@ -53,7 +53,7 @@ CommandTest::CommandTest() : state_(std::make_unique<State>()) {
 CommandTest::~CommandTest() {
   runUntilIdle();
   platform().setHomes({});
-  NDPlatform::unregisterPlatform(CommandPlatform::shared());
+  NDPlatform::unregisterPlatform(TestPlatform::shared());
 }
 
 void CommandTest::useHomes(std::vector<std::shared_ptr<TestHome>> homes) {

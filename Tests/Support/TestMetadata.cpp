@@ -1,4 +1,4 @@
-#include "Assistant/CommandMetadata.h"
+#include "Support/TestMetadata.h"
 
 #include <array>
 #include <cstdint>
@@ -68,48 +68,48 @@ Attribute attributeOf(const NDString& name) {
 
 }  // namespace
 
-NDString CommandMetadata::mapFromAssistantServiceName(const NDString& name) const {
+NDString TestMetadata::mapFromAssistantServiceName(const NDString& name) const {
   return secondOf(kServices, name);
 }
 
-NDString CommandMetadata::mapToAssistantServiceName(const NDString& type) const {
+NDString TestMetadata::mapToAssistantServiceName(const NDString& type) const {
   return firstOf(kServices, type);
 }
 
-NDString CommandMetadata::mapToAssistantCharacteristicName(const NDString& type) const {
+NDString TestMetadata::mapToAssistantCharacteristicName(const NDString& type) const {
   return textOf(attributeOf(type).name);
 }
 
-NDString CommandMetadata::mapReadCharcteristicFromAssistantName(const NDString& name) const {
+NDString TestMetadata::mapReadCharcteristicFromAssistantName(const NDString& name) const {
   return textOf(attributeOf(name).read);
 }
 
-NDString CommandMetadata::mapWriteCharcteristicFromAssistantName(const NDString& name) const {
+NDString TestMetadata::mapWriteCharcteristicFromAssistantName(const NDString& name) const {
   return textOf(attributeOf(name).write);
 }
 
-NDString CommandMetadata::mapCharacteristicValueType(const NDString& name) const {
+NDString TestMetadata::mapCharacteristicValueType(const NDString& name) const {
   return textOf(attributeOf(name).valueType);
 }
 
-NDString CommandMetadata::mapFromAssistantUnitName(const NDString& name) const {
+NDString TestMetadata::mapFromAssistantUnitName(const NDString& name) const {
   return secondOf(kUnits, name);
 }
 
-NDString CommandMetadata::mapToAssistantUnitName(const NDString& unit) const {
+NDString TestMetadata::mapToAssistantUnitName(const NDString& unit) const {
   return firstOf(kUnits, unit);
 }
 
-NDString CommandMetadata::characteristicValueUnit(const NDString& type) const {
+NDString TestMetadata::characteristicValueUnit(const NDString& type) const {
   return textOf(attributeOf(type).unit);
 }
 
-bool CommandMetadata::supportsLocalization(const NDString& type) const {
+bool TestMetadata::supportsLocalization(const NDString& type) const {
   return attributeOf(type).isLocalized;
 }
 
-NDValueRef CommandMetadata::mapFromAssistantCharacteristicValue_name(const NDValueRef& value,
-                                                                     const NDString& name) const {
+NDValueRef TestMetadata::mapFromAssistantCharacteristicValue_name(const NDValueRef& value,
+                                                                  const NDString& name) const {
   if (!value || attributeOf(name).name != "CLIMATE_MODE") return value;
   for (std::size_t place = 0; place < kModes.size(); ++place) {
     if (value->stringValue() == kModes[place]) {
@@ -119,8 +119,8 @@ NDValueRef CommandMetadata::mapFromAssistantCharacteristicValue_name(const NDVal
   return value;
 }
 
-NDValueRef CommandMetadata::mapToAssistantCharacteristicValue_name(const NDValueRef& value,
-                                                                   const NDString& name) const {
+NDValueRef TestMetadata::mapToAssistantCharacteristicValue_name(const NDValueRef& value,
+                                                                const NDString& name) const {
   if (!value || attributeOf(name).name != "CLIMATE_MODE" || !value->isNumber()) return value;
   const auto place = static_cast<std::size_t>(value->integerValue());
   return place < kModes.size() ? NDValue::text(kModes[place]) : value;

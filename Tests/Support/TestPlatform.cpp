@@ -1,16 +1,16 @@
-#include "Assistant/CommandPlatform.h"
+#include "Support/TestPlatform.h"
 
 #include <atomic>
 #include <functional>
 #include <utility>
 
-#include "Assistant/CommandMetadata.h"
 #include "PlatformModel/System/NDDeliveryHold.h"
 #include "PlatformModel/System/NDMutex.h"
+#include "Support/TestMetadata.h"
 
 namespace nidus {
 
-class CommandPlatform::LogClient final : public NDSystemLogClient {
+class TestPlatform::LogClient final : public NDSystemLogClient {
  public:
   void send(const NDSystemLogMessage& message) override {
     const NDLock lock(mutex_);
@@ -32,7 +32,7 @@ class CommandPlatform::LogClient final : public NDSystemLogClient {
   std::vector<std::string> messages_ ND_GUARDED_BY(mutex_);
 };
 
-class CommandPlatform::Log final : public NDSystemLog {
+class TestPlatform::Log final : public NDSystemLog {
  public:
   explicit Log(std::shared_ptr<NDSystemLogClient> client) : client_(std::move(client)) {}
 
@@ -49,7 +49,7 @@ class CommandPlatform::Log final : public NDSystemLog {
   const std::shared_ptr<NDSystemLogClient> client_;
 };
 
-class CommandPlatform::Preferences final : public NDPreferences {
+class TestPlatform::Preferences final : public NDPreferences {
  public:
   [[nodiscard]] BooleanReading booleanForKey_domain_container(
       const NDString& key, const NDString& domain, const NDString& containerPath) override {
@@ -66,14 +66,14 @@ class CommandPlatform::Preferences final : public NDPreferences {
   std::atomic<int> logLevel{0};
 };
 
-class CommandPlatform::Locale final : public NDLocale {
+class TestPlatform::Locale final : public NDLocale {
  public:
   [[nodiscard]] std::optional<bool> usesMetricSystem() override { return isMetric; }
   std::optional<bool> isMetric = true;
 };
 
 /// Keeps the one registration that the plug-in makes.
-class CommandPlatform::Notifications final : public NDNotificationCenter {
+class TestPlatform::Notifications final : public NDNotificationCenter {
  public:
   [[nodiscard]] std::shared_ptr<Token> registerForName_queue_handler(
       const NDString& /*name*/, std::shared_ptr<NDQueue> /*queue*/,
@@ -91,8 +91,8 @@ class CommandPlatform::Notifications final : public NDNotificationCenter {
 };
 
 /// Reports its homes, through the shared queue, once it may.
-class CommandPlatform::Manager final : public NDHomeManager,
-                                       public std::enable_shared_from_this<Manager> {
+class TestPlatform::Manager final : public NDHomeManager,
+                                    public std::enable_shared_from_this<Manager> {
  public:
   explicit Manager(NDArray<NDHome> homes) : homes_(std::move(homes)) {}
 
@@ -129,13 +129,13 @@ class NoDeviceInformation final : public NDDeviceInformation {
 
 }  // namespace
 
-const std::shared_ptr<CommandPlatform>& CommandPlatform::shared() {
-  static const auto platform = std::make_shared<CommandPlatform>();
+const std::shared_ptr<TestPlatform>& TestPlatform::shared() {
+  static const auto platform = std::make_shared<TestPlatform>();
   return platform;
 }
 
-CommandPlatform::CommandPlatform()
-    : metadata_(std::make_shared<CommandMetadata>()),
+TestPlatform::TestPlatform()
+    : metadata_(std::make_shared<TestMetadata>()),
       clock_(std::make_shared<NDSystemClock>()),
       mainQueue_(std::make_shared<NDMainQueue>()),
       sharedQueue_(std::make_shared<NDMainQueue>()),
@@ -144,52 +144,48 @@ CommandPlatform::CommandPlatform()
       preferences_(std::make_shared<Preferences>()),
       locale_(std::make_shared<Locale>()) {}
 
-CommandPlatform::~CommandPlatform() = default;
+TestPlatform::~TestPlatform() = default;
 
-std::shared_ptr<NDHomeManager> CommandPlatform::createHomeManager() {
+std::shared_ptr<NDHomeManager> TestPlatform::createHomeManager() {
   auto manager = std::make_shared<Manager>(homes_);
   if (!isSilent_) manager->reportOn(sharedQueue_);
   return manager;
 }
 
-std::shared_ptr<NDPreferences> CommandPlatform::preferences() { return preferences_; }
+std::shared_ptr<NDPreferences> TestPlatform::preferences() { return preferences_; }
 
-std::shared_ptr<NDDeviceInformation> CommandPlatform::deviceInformation() {
+std::shared_ptr<NDDeviceInformation> TestPlatform::deviceInformation() {
   return std::make_shared<NoDeviceInformation>();
 }
 
-std::shared_ptr<NDLocale> CommandPlatform::locale() { return locale_; }
+std::shared_ptr<NDLocale> TestPlatform::locale() { return locale_; }
 
-std::shared_ptr<NDSystemLog> CommandPlatform::systemLog() {
-  return std::make_shared<Log>(logClient_);
-}
+std::shared_ptr<NDSystemLog> TestPlatform::systemLog() { return std::make_shared<Log>(logClient_); }
 
-std::shared_ptr<NDNotificationCenter> CommandPlatform::notificationCenter() {
-  return notifications_;
-}
+std::shared_ptr<NDNotificationCenter> TestPlatform::notificationCenter() { return notifications_; }
 
-void CommandPlatform::setHomes(std::vector<std::shared_ptr<TestHome>> homes) {
+void TestPlatform::setHomes(std::vector<std::shared_ptr<TestHome>> homes) {
   homes_ = NDArray<NDHome>(std::vector<std::shared_ptr<NDHome>>(homes.begin(), homes.end()));
 }
 
-void CommandPlatform::configureHomes(bool areConfigured) {
+void TestPlatform::configureHomes(bool areConfigured) {
   preferences_->areHomesConfigured = areConfigured;
 }
 
-void CommandPlatform::setLocale(std::optional<bool> isMetric) { locale_->isMetric = isMetric; }
+void TestPlatform::setLocale(std::optional<bool> isMetric) { locale_->isMetric = isMetric; }
 
-void CommandPlatform::setLogLevel(int level) {
+void TestPlatform::setLogLevel(int level) {
   preferences_->logLevel = level;
   notifications_->post();
 }
 
-void CommandPlatform::runUntilIdle() {
+void TestPlatform::runUntilIdle() {
   while (sharedQueue_->drain() + mainQueue_->drain() > 0) {
   }
 }
 
-std::vector<std::string> CommandPlatform::log() const { return logClient_->messages(); }
+std::vector<std::string> TestPlatform::log() const { return logClient_->messages(); }
 
-void CommandPlatform::clearLog() { logClient_->clear(); }
+void TestPlatform::clearLog() { logClient_->clear(); }
 
 }  // namespace nidus

@@ -10,15 +10,15 @@
 
 namespace nidus {
 
-/// The platform of the tests of commands: homes in memory, queues that the test drains, and a log
+/// The platform of unit tests: homes in memory, queues that the test drains, and a log
 /// that is kept. One object serves all tests of a process, because the plug-in opens the log once.
-class CommandPlatform final : public NDPlatform {
+class TestPlatform final : public NDPlatform {
  public:
   /// The one object, never null.
-  [[nodiscard]] static const std::shared_ptr<CommandPlatform>& shared();
+  [[nodiscard]] static const std::shared_ptr<TestPlatform>& shared();
 
-  CommandPlatform();
-  ~CommandPlatform() override;
+  TestPlatform();
+  ~TestPlatform() override;
 
   [[nodiscard]] std::shared_ptr<NDHomeManager> createHomeManager() override;
   [[nodiscard]] NDString homeConfigurationPath() override { return "/homes"; }

@@ -6,8 +6,8 @@
 
 namespace nidus {
 
-/// A mapper that knows the few names and types that the tests of commands use, in tables.
-class CommandMetadata final : public NDNAPMetadata {
+/// A mapper that knows the few names and types that tests use, in tables.
+class TestMetadata final : public NDNAPMetadata {
  public:
   [[nodiscard]] NDString mapFromAssistantServiceName(const NDString& name) const override;
   [[nodiscard]] NDString mapToAssistantServiceName(const NDString& type) const override;
