@@ -1,11 +1,10 @@
 #include "Assistant/CommandTest.h"
 
 #include <algorithm>
-#include <cstdlib>
 #include <utility>
 
 #include "PlatformModel/System/NDMutex.h"
-#include "Support/TestPlatform.h"
+#include "Support/PlatformTest.h"
 
 namespace nidus {
 namespace {
@@ -181,14 +180,10 @@ std::vector<std::string> CommandTest::entityTexts(const NDDictionary& reply, std
 
 void CommandTest::inProcessWithLocale(std::optional<bool> isMetric,
                                       const std::function<void()>& body) {
-  GTEST_FLAG_SET(death_test_style, "threadsafe");
-  EXPECT_EXIT(
-      {
-        setLocale(isMetric);
-        body();
-        std::_Exit(HasFailure() ? EXIT_FAILURE : EXIT_SUCCESS);
-      },
-      ::testing::ExitedWithCode(EXIT_SUCCESS), "");
+  inFreshProcess([&] {
+    setLocale(isMetric);
+    body();
+  });
 }
 
 }  // namespace nidus
