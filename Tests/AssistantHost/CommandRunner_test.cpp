@@ -20,7 +20,7 @@ class CommandRunnerTest : public ::testing::Test {
   FakeModule module_;
   const std::shared_ptr<NDMainQueue> mainQueue_ = std::make_shared<NDMainQueue>();
   CommandRunner runner_{module_.module(), mainQueue_};
-  const VAHACommand command_;
+  VAHACommand command_;
 };
 
 TEST_F(CommandRunnerTest, GivesTheReply) {
