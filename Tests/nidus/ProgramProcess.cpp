@@ -45,7 +45,8 @@ pid_t spawn(const ProgramStart& start, const std::array<int, 3>& files) {
   std::vector<std::string> environment = environmentOf(start);
   posix_spawn_file_actions_t actions;
   posix_spawn_file_actions_init(&actions);
-  for (int i = 0; i < 3; ++i) posix_spawn_file_actions_adddup2(&actions, files[i], i);
+  int target = 0;
+  for (const int file : files) posix_spawn_file_actions_adddup2(&actions, file, target++);
   pid_t process = -1;
   const int error = posix_spawn(&process, start.program.c_str(), &actions, nullptr,
                                 pointersTo(arguments).data(), pointersTo(environment).data());
