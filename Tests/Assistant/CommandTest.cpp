@@ -4,7 +4,8 @@
 #include <utility>
 
 #include "PlatformModel/System/NDMutex.h"
-#include "Support/PlatformTest.h"
+#include "Support/FreshProcess.h"
+#include "Support/TestPlatform.h"
 
 namespace nidus {
 namespace {

@@ -1,7 +1,5 @@
 #include "Support/PlatformTest.h"
 
-#include <cstdlib>
-
 namespace nidus {
 
 PlatformTest::PlatformTest() {
@@ -24,16 +22,6 @@ std::shared_ptr<TestHome> PlatformTest::useHome(HomeBuilder& builder) {
   auto home = builder.build();
   platform().setHomes({home});
   return home;
-}
-
-void inFreshProcess(const std::function<void()>& body) {
-  GTEST_FLAG_SET(death_test_style, "threadsafe");
-  EXPECT_EXIT(
-      {
-        body();
-        std::_Exit(::testing::Test::HasFailure() ? EXIT_FAILURE : EXIT_SUCCESS);
-      },
-      ::testing::ExitedWithCode(EXIT_SUCCESS), "");
 }
 
 }  // namespace nidus

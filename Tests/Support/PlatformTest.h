@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -26,9 +25,5 @@ class PlatformTest : public ::testing::Test {
   /// The messages in order, each behind its level; those of before the test are left out.
   [[nodiscard]] static std::vector<std::string> log() { return platform().log(); }
 };
-
-/// Runs `body` in a fresh process, where nothing has been done yet but what the test has done
-/// before; what fails there fails the test here. At most once in a test.
-void inFreshProcess(const std::function<void()>& body);
 
 }  // namespace nidus
