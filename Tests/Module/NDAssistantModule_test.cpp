@@ -1,25 +1,197 @@
 #include "PlatformModel/Assistant/NDAssistantModule.h"
 
 #include <dlfcn.h>
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 
+#include <filesystem>
+#include <iterator>
 #include <stdexcept>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "Module/ExportedSymbols.h"
+#include "PlatformModel/Assistant/VAHAConstants.h"
+#include "PlatformModel/Assistant/VAHAFilter.h"
+#include "Support/FreshProcess.h"
+#include "Support/HomeBuilder.h"
+#include "Support/TestPlatform.h"
 
 namespace nidus {
 namespace {
 
-/// Opens the module as a host does and gives what it offers; never null.
-const NDAssistantModule* openModule() {
+using ::testing::ElementsAre;
+using ::testing::HasSubstr;
+using ::testing::IsEmpty;
+
+using Texts = std::vector<std::string>;
+
+void* openLibrary() {
   void* const library = dlopen(NIDUS_MODULE_FILE, RTLD_NOW | RTLD_LOCAL);
   if (!library) throw std::runtime_error(dlerror());
-  void* const entry = dlsym(library, kNDAssistantModuleEntryName);
-  if (!entry) throw std::runtime_error(dlerror());
-  return reinterpret_cast<NDAssistantModuleEntryFunction*>(entry)();
+  return library;
 }
 
+/// Opens the module as a host does and gives what it offers; never null.
+const NDAssistantModule& openModule() {
+  void* const entry = dlsym(openLibrary(), kNDAssistantModuleEntryName);
+  if (!entry) throw std::runtime_error(dlerror());
+  return *reinterpret_cast<NDAssistantModuleEntryFunction*>(entry)();
+}
+
+std::ptrdiff_t threadCount() {
+  return std::distance(std::filesystem::directory_iterator("/proc/self/task"), {});
+}
+
+std::string textAt(const NDDictionary& dictionary, const char* key) {
+  const NDDictionaryValue* value = dictionary.find(key);
+  return value ? std::get<NDString>(value->content()).str() : "none";
+}
+
+class Request final : public VAHACommand {};
+
+class BeginInfo final : public AFSyncBeginInfo {
+ public:
+  void resetWithValidity(const NDString& validity) override { resets.push_back(validity); }
+  std::vector<NDString> resets;
+};
+
+class ChangeInfo final : public AFSyncChangeInfo {
+ public:
+  void setObject(std::shared_ptr<const VAHAEntity> object) override { entity = std::move(object); }
+  void setPostAnchor(const NDString& anchor) override { postAnchor = anchor; }
+  std::shared_ptr<const VAHAEntity> entity;
+  NDString postAnchor;
+};
+
 TEST(NDAssistantModuleTest, TellsItsVersions) {
-  EXPECT_EQ(openModule()->interfaceVersion, kNDAssistantModuleInterfaceVersion);
-  EXPECT_STREQ(openModule()->abi, kNDAssistantModuleABI);
+  EXPECT_EQ(openModule().interfaceVersion, kNDAssistantModuleInterfaceVersion);
+  EXPECT_STREQ(openModule().abi, kNDAssistantModuleABI);
+}
+
+TEST(NDAssistantModuleTest, ExportsItsEntryAndTheLogAlone) {
+  EXPECT_THAT(exportedSymbols(NIDUS_MODULE_FILE),
+              ElementsAre("NDAssistantModuleEntry", "WLOLog", "WLOLogV", "WLOShouldLogAtLevel",
+                          "kWLOLogLevelKey"));
+}
+
+TEST(NDAssistantModuleTest, ExportsTheKeyOfTheLogLevel) {
+  EXPECT_STREQ(static_cast<const char*>(dlsym(openLibrary(), "kWLOLogLevelKey")), "NidusLogLevel");
+}
+
+TEST(NDAssistantModuleTest, IsNotUnloaded) {
+  EXPECT_EQ(dlclose(openLibrary()), 0);
+  EXPECT_TRUE(dlopen(NIDUS_MODULE_FILE, RTLD_NOW | RTLD_NOLOAD));
+}
+
+TEST(NDAssistantModuleTest, WithoutPlatformFactoriesSayWhy) {
+  const NDAssistantModule& module = openModule();
+  Texts messages(3);
+  bool isReceived = false;
+  EXPECT_FALSE(module.makeCommand(Request(), nullptr, messages[0]));
+  EXPECT_FALSE(module.makeSyncHandler(messages[1]));
+  EXPECT_FALSE(module.gatherRecords([&](const auto&) { isReceived = true; }, messages[2]));
+  EXPECT_THAT(messages, ::testing::Each(HasSubstr("no home platform is registered")));
+  EXPECT_FALSE(isReceived);
+}
+
+/// Uses the module with a platform that has one home.
+class OpenModuleTest : public ::testing::Test {
+ protected:
+  OpenModuleTest() {
+    EXPECT_EQ(NDPlatform::registerPlatform(TestPlatform::shared()), "");
+    platform().configureHomes(true);
+    platform().setHomes(
+        {HomeBuilder("Cabin").room("Kitchen").light("Lamp", {power(true)}).build()});
+  }
+  ~OpenModuleTest() override {
+    platform().runUntilIdle();
+    platform().setHomes({});
+    NDPlatform::unregisterPlatform(TestPlatform::shared());
+  }
+
+  static TestPlatform& platform() { return *TestPlatform::shared(); }
+  /// The types and names of the records that the module gathers, each list of them behind a "|".
+  static Texts gatheredRecords() {
+    Texts texts;
+    std::string message;
+    const auto receive = [&texts](const NDDictionaryList& records) {
+      texts.emplace_back("|");
+      for (const auto& record : records) {
+        const auto& fields = std::get<NDDictionary>(record.content());
+        texts.push_back(textAt(fields, "objectType") + " " + textAt(fields, "objectName"));
+      }
+    };
+    EXPECT_TRUE(openModule().gatherRecords(receive, message));
+    platform().runUntilIdle();
+    EXPECT_EQ(message, "");
+    return texts;
+  }
+};
+
+TEST_F(OpenModuleTest, OpeningShowsNothing) {
+  inFreshProcess([] {
+    const auto threads = threadCount();
+    ::testing::internal::CaptureStdout();
+    ::testing::internal::CaptureStderr();
+    (void)openModule();
+    EXPECT_EQ(::testing::internal::GetCapturedStdout(), "");
+    EXPECT_EQ(::testing::internal::GetCapturedStderr(), "");
+    EXPECT_EQ(threadCount(), threads);
+    EXPECT_EQ(platform().testPreferences().uses(), 0U);
+    EXPECT_THAT(platform().testLog().openings(), IsEmpty());
+    EXPECT_THAT(platform().testNotifications().registrations(), IsEmpty());
+    EXPECT_EQ(platform().deviceQueries(), 0U);
+  });
+}
+
+TEST_F(OpenModuleTest, CommandReadsALamp) {
+  Request request;
+  auto filter = std::make_shared<VAHASearchCriteriaFilter>();
+  filter->setServiceName("Lamp");
+  request.setFilter(filter);
+  auto action = std::make_shared<VAHAAction>();
+  action->setActionType(VAHAActionTypeGETValue);
+  action->setAttribute("POWER");
+  request.setActions({action});
+  Texts outcomes;
+  std::string message;
+  const auto command = openModule().makeCommand(request, nullptr, message);
+  ASSERT_TRUE(command) << message;
+  command->performWithCompletion([&outcomes](const NDDictionary& reply) {
+    outcomes.push_back(textAt(reply, "commandOutcome"));
+  });
+  platform().runUntilIdle();
+  EXPECT_THAT(outcomes, ElementsAre(VAHACommandOutcomeCOMMAND_SUCCESSValue));
+}
+
+TEST_F(OpenModuleTest, SyncServesAnEntity) {
+  std::string message;
+  const auto handler = openModule().makeSyncHandler(message);
+  ASSERT_TRUE(handler) << message;
+  const auto begin = std::make_shared<BeginInfo>();
+  handler->beginSyncWithAnchor_validity_forKey_beginInfo(nullptr, nullptr, "com.corvane.nidus.name",
+                                                         begin);
+  EXPECT_THAT(begin->resets, ElementsAre("3405691582"));
+  ChangeInfo change;
+  handler->getChangeAfterAnchor_changeInfo("1", change);
+  ASSERT_TRUE(change.entity);
+  EXPECT_EQ(change.entity->name(), "Lamp");
+  EXPECT_EQ(change.postAnchor, "2");
+}
+
+TEST_F(OpenModuleTest, RecordsAreGathered) {
+  EXPECT_THAT(gatheredRecords(), ElementsAre("|", "HOME Cabin", "SERVICE Lamp", "ROOM Kitchen"));
+}
+
+TEST_F(OpenModuleTest, UnconfiguredHomesHaveNoRecords) {
+  platform().configureHomes(false);
+  EXPECT_THAT(gatheredRecords(), ElementsAre("|"));
+}
+
+TEST_F(OpenModuleTest, MissingHomesHaveNoRecords) {
+  platform().setHomes({});
+  EXPECT_THAT(gatheredRecords(), ElementsAre("|"));
 }
 
 }  // namespace
