@@ -9,24 +9,17 @@
 namespace nidus {
 namespace {
 
-/// Makes the results of a batch; false when an accessory requires the device to be unlocked, which
-/// drops the rest of the batch.
-bool addReadResults(const ActionRun& run, const std::vector<NDCharacteristicResponse>& responses) {
-  for (const NDCharacteristicResponse& response : responses) {
-    if (requiresUnlock(response.error)) return false;
-    run.addResultIfAnswer(outcomeOfRead(response.error), response.characteristic->service());
-  }
-  return true;
-}
-
 /// Takes the answer of one home. The batch leaves the group also when the device must be unlocked,
 /// so that the handler hears of that and then of what the other batches have found.
 void batchDidRead(const ActionRun& run, const std::optional<NDError>& error,
                   const std::vector<NDCharacteristicResponse>& responses) {
   ActionRun::Answer answer(run);
-  const bool isLocked = requiresUnlock(error) || !addReadResults(run, responses);
+  const bool isUnlocked =
+      visitUntilLocked(error, responses, [&run](const NDCharacteristicResponse& response) {
+        run.addResultIfAnswer(outcomeOfRead(response.error), response.characteristic->service());
+      });
   answer.leave();
-  if (isLocked) run.reportUnlockRequired();
+  if (!isUnlocked) run.reportUnlockRequired();
 }
 
 void readByHome(const std::shared_ptr<const ActionRun>& run,

@@ -76,14 +76,17 @@ struct HomeUpdate {
 
   void didRead(const std::optional<NDError>& error, const Responses& responses) const;
   void didWrite(const Responses& responses) const;
-  bool addWrites(Writes& writes, const Responses& responses) const;
+  void addWriteOrResult(Writes& writes, const NDCharacteristicResponse& response) const;
   void addWrite(Writes& writes, const std::shared_ptr<NDCharacteristic>& characteristic) const;
 };
 
 void HomeUpdate::didRead(const std::optional<NDError>& error, const Responses& responses) const {
   ActionRun::Answer answer(*run);
   Writes writes;
-  if (requiresUnlock(error) || !addWrites(writes, responses)) {
+  const bool isUnlocked = visitUntilLocked(
+      error, responses,
+      [&](const NDCharacteristicResponse& response) { addWriteOrResult(writes, response); });
+  if (!isUnlocked) {
     // The unlock is the only reply of the command: the group stays entered for good, and the report
     // of the results never comes due.
     answer.stayEntered();
@@ -99,18 +102,13 @@ void HomeUpdate::didRead(const std::optional<NDError>& error, const Responses& r
       });
 }
 
-/// Makes the writes, and the results of what could not be read; false when an accessory requires
-/// the device to be unlocked.
-bool HomeUpdate::addWrites(Writes& writes, const Responses& responses) const {
-  for (const NDCharacteristicResponse& response : responses) {
-    if (requiresUnlock(response.error)) return false;
-    if (response.error) {
-      run->addResult(outcomeOfRead(response.error), response.characteristic->service());
-    } else {
-      addWrite(writes, response.characteristic);
-    }
+/// Makes the write of a value that was read, and the result of one that could not be.
+void HomeUpdate::addWriteOrResult(Writes& writes, const NDCharacteristicResponse& response) const {
+  if (response.error) {
+    run->addResult(outcomeOfRead(response.error), response.characteristic->service());
+  } else {
+    addWrite(writes, response.characteristic);
   }
-  return true;
 }
 
 void HomeUpdate::addWrite(Writes& writes,

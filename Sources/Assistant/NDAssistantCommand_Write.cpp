@@ -87,24 +87,17 @@ WriteTable decideWrites(const ActionRun& run,
   return table;
 }
 
-/// Makes the results of a batch; false when an accessory requires the device to be unlocked, which
-/// drops the rest of the batch.
-bool addWriteResults(const ActionRun& run, const std::vector<NDCharacteristicResponse>& responses) {
-  for (const NDCharacteristicResponse& response : responses) {
-    if (requiresUnlock(response.error)) return false;
-    run.addResult(outcomeOfWrite(response.error), response.characteristic->service());
-  }
-  return true;
-}
-
 /// Takes the answer of one home. The batch leaves the group also when the device must be unlocked,
 /// so that the handler hears of that and then of what became of the other batches.
 void batchDidWrite(const ActionRun& run, const std::optional<NDError>& error,
                    const std::vector<NDCharacteristicResponse>& responses) {
   ActionRun::Answer answer(run);
-  const bool isLocked = requiresUnlock(error) || !addWriteResults(run, responses);
+  const bool isUnlocked =
+      visitUntilLocked(error, responses, [&run](const NDCharacteristicResponse& response) {
+        run.addResult(outcomeOfWrite(response.error), response.characteristic->service());
+      });
   answer.leave();
-  if (isLocked) run.reportUnlockRequired();
+  if (!isUnlocked) run.reportUnlockRequired();
 }
 
 /// Writes `setValue` to all of the table. The values decided there are not what is written: they
