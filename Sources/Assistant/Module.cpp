@@ -56,13 +56,13 @@ bool gatherRecords(std::function<void(const NDDictionaryList&)> receive, std::st
   return false;
 }
 
-constinit const NDAssistantModule module = {kNDAssistantModuleInterfaceVersion,
-                                            kNDAssistantModuleABI, &makeCommand, &makeSyncHandler,
-                                            &gatherRecords};
+constinit const NDAssistantModule kModule = {kNDAssistantModuleInterfaceVersion,
+                                             kNDAssistantModuleABI, &makeCommand, &makeSyncHandler,
+                                             &gatherRecords};
 
 }  // namespace
 }  // namespace nidus
 
 extern "C" ND_EXPORT const nidus::NDAssistantModule* NDAssistantModuleEntry() {
-  return &nidus::module;
+  return &nidus::kModule;
 }

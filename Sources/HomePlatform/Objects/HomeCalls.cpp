@@ -84,7 +84,7 @@ std::int64_t firstError(const DriverAnswers& answers) {
 
 }  // namespace
 
-void HomeCalls::read(const NDUUID& home, NDArray<NDCharacteristic> characteristics,
+void HomeCalls::read(const NDUUID& home, const NDArray<NDCharacteristic>& characteristics,
                      NDBatchCompletion completion) {
   Characteristics asked(characteristics.begin(), characteristics.end());
   std::vector<CharacteristicAddress> targets;
@@ -163,7 +163,7 @@ HomeCalls::CurrentHome HomeCalls::findHome(const NDUUID& home) const {
   return {nullptr, true};
 }
 
-void HomeCalls::observe(PlatformCall call) const {
+void HomeCalls::observe(const PlatformCall& call) const {
   if (parts_.observer) parts_.observer(call);
 }
 

@@ -28,7 +28,7 @@ class HomeCalls : public std::enable_shared_from_this<HomeCalls> {
 
   /// Each returns at once; its completion runs on the queue, exactly once, or is destroyed when the
   /// queue is shut down.
-  void read(const NDUUID& home, NDArray<NDCharacteristic> characteristics,
+  void read(const NDUUID& home, const NDArray<NDCharacteristic>& characteristics,
             NDBatchCompletion completion);
   void write(const NDUUID& home, std::vector<NDCharacteristicWriteRequestTuple> writes,
              NDBatchCompletion completion);
@@ -38,7 +38,7 @@ class HomeCalls : public std::enable_shared_from_this<HomeCalls> {
   struct CurrentHome;
 
   [[nodiscard]] CurrentHome findHome(const NDUUID& home) const;
-  void observe(PlatformCall call) const;
+  void observe(const PlatformCall& call) const;
   void runScene(const NDUUID& home, const NDUUID& actionSet, NDExecuteCompletion completion) const;
 
   const Parts parts_;

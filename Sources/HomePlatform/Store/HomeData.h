@@ -71,6 +71,7 @@ struct ZoneData {
 struct ServiceAddress {
   NDUUID accessory;
   std::int64_t service = 0;
+  // NOLINTNEXTLINE(modernize-use-nullptr): a mistake of the check about defaulted comparisons
   friend auto operator<=>(const ServiceAddress&, const ServiceAddress&) = default;
 };
 
@@ -85,6 +86,7 @@ struct CharacteristicAddress {
   NDUUID accessory;
   std::int64_t service = 0;
   std::int64_t characteristic = 0;
+  // NOLINTNEXTLINE(modernize-use-nullptr): as above
   friend auto operator<=>(const CharacteristicAddress&, const CharacteristicAddress&) = default;
 };
 
