@@ -116,7 +116,7 @@ void HomeCalls::write(const NDUUID& home, std::vector<NDCharacteristicWriteReque
     values.push_back({address, std::move(tuple.value)});
     asked.push_back(std::move(tuple.characteristic));
   }
-  observe(std::move(call));
+  observe(call);
   parts_.queue->async([self = shared_from_this(), home, asked = std::move(asked),
                        values = std::move(values), completion = std::move(completion)]() mutable {
     const CurrentHome current = self->findHome(home);
