@@ -45,8 +45,9 @@ void append(ObjectList& list, const ObjectList& more) {
   list.insert(list.end(), more.begin(), more.end());
 }
 
+/// Says whether `object` is a room that is meant; a room without a name is nobody's.
 bool isRoom(const HomeObjectRecord& object, const NDString& roomName, const NDString& zoneName) {
-  return object.objectType == VAHAEntityTypeROOMValue &&
+  return object.objectType == VAHAEntityTypeROOMValue && object.objectName &&
          (!zoneName || isEqualButDiacritics(object.objectZone, zoneName)) &&
          (!roomName || isEqualButDiacritics(object.objectName, roomName));
 }

@@ -263,6 +263,11 @@ TEST_F(FilterTest, FindsObjectsOfEveryRoomWithoutNames) {
   EXPECT_THAT(names(found), ElementsAre("Lamp"));
 }
 
+TEST_F(FilterTest, FindsNothingInRoomsWithoutName) {
+  snapshot({roomRecord(nullptr, "Ground"), serviceInRoom("Lamp", ""), serviceRecord("Fan")});
+  EXPECT_THAT(find({.zone = "Ground"}), IsEmpty());
+}
+
 TEST_F(FilterTest, LooksRoomsUpInTheSnapshotNotTheList) {
   snapshot({roomRecord("Hall"), serviceInRoom("Lamp", "Hall"), serviceInRoom("Fan", "Hall")});
   const NDAssistantCommand::ObjectList list = {&command_->nidusObjects()[2],
@@ -325,6 +330,14 @@ TEST_F(FilterTest, LogsNothingBelowItsLevel) {
   logLevel(5);
   snapshot({serviceRecord("Lamp")});
   EXPECT_THAT(find({.service = "Lamp"}), ElementsAre("Lamp"));
+  EXPECT_THAT(log(), IsEmpty());
+}
+
+TEST_F(FilterTest, WarnsOfNothingBelowItsLevel) {
+  logLevel(3);
+  snapshot({homeRecord("Home"), homeRecord("Home"), serviceRecord("Lamp")});
+  EXPECT_THAT(find({}, "Home"), ElementsAre("null"));
+  EXPECT_THAT(find({.entityType = "ROOM", .attribute = "POWER"}), IsEmpty());
   EXPECT_THAT(log(), IsEmpty());
 }
 
@@ -451,6 +464,13 @@ TEST_F(ReachTest, LogsAndSkipsWhatIsNoService) {
   EXPECT_THAT(log(),
               ElementsAre("4 Filtered object " + description(*objects[0]) + " not a service",
                           "4 Filtered object " + description(*objects[2]) + " not a service"));
+}
+
+TEST_F(ReachTest, SkipsQuietlyBelowTheLevel) {
+  const auto command = performed(HomeBuilder("Cottage").light("Lamp").build());
+  logLevel(3);
+  EXPECT_EQ(command->filterObjects_forcharacteristicType(command->allObjects(), kPower).size(), 1U);
+  EXPECT_THAT(log(), IsEmpty());
 }
 
 TEST_F(ReachTest, FindsNothingForNullType) {
