@@ -201,6 +201,15 @@ TEST_F(UpdateTest, AcceptsOtherActionTypes) {
   EXPECT_THAT(written(*home), ElementsAre("Lamp=40"));
 }
 
+TEST_F(UpdateTest, ReadsTheWriteTypeForTargetValue) {
+  const auto home = useHome(HomeBuilder("Cottage").thermostat(
+      "Stove", {currentTemperature(19.5F), targetTemperature(21.0F)}));
+  actInAllHomes({.type = "GET_TARGET_VALUE", .attribute = "TEMPERATURE"});
+  EXPECT_THAT(batchesRead(*home),
+              ElementsAre(ElementsAre(home->characteristic("Stove", kTargetTemperature))));
+  EXPECT_THAT(written(*home), ElementsAre("Stove=21"));
+}
+
 TEST_F(UpdateTest, RefusesReadOnlyWithoutReading) {
   const auto home = useHome(HomeBuilder("Cottage")
                                 .light("Lamp", {brightness(40).readOnly()})
@@ -373,6 +382,16 @@ TEST_F(UpdateTest, ReportsWhatAnOverrideRefuses) {
   EXPECT_THAT(written(*home), ElementsAre("Bulb=1"));
   EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp TOO_BRIGHT POWER; Bulb SUCCESS POWER"));
   EXPECT_THAT(log(4), ElementsAre("4 Update boundary error TOO_BRIGHT for service Lamp/12"));
+}
+
+TEST_F(UpdateTest, ReportsQuietlyWhatAnOverrideRefuses) {
+  logLevel(3);
+  useHome(HomeBuilder("Cottage").light("Lamp"));
+  const auto request =
+      makeCommand({.serviceType = "LIGHT"}, {{.type = "TOGGLE", .attribute = "POWER"}});
+  perform(std::make_shared<RefusingCommand>(*request));
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp TOO_BRIGHT POWER"));
+  EXPECT_THAT(log(), IsEmpty());
 }
 
 class UpdateValueTest : public CommandTest {};

@@ -10,10 +10,12 @@
 namespace nidus {
 namespace {
 
+using testing::Contains;
 using testing::Each;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
+using testing::StartsWith;
 
 class SetTest : public CommandTest {
  protected:
@@ -91,6 +93,27 @@ TEST_F(SetTest, MapsWordsToThePlatformsValues) {
   set("CLIMATE_MODE", stringValue("HEAT"));
   EXPECT_THAT(written(*home), ElementsAre("Stove=1"));
   EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Stove SUCCESS CLIMATE_MODE='HEAT'"));
+}
+
+TEST_F(SetTest, TakesFahrenheitOffTheMetricSystemOnce) {
+  inProcessWithLocale(false, [this] {
+    const auto home = useHome(HomeBuilder("Cottage")
+                                  .thermostat("Stove", {targetTemperature(21.0F)})
+                                  .thermostat("Radiator", {targetTemperature(21.0F)}));
+    set("TEMPERATURE", integerValue(72));
+    EXPECT_THAT(written(*home), ElementsAre("Stove=22.222221", "Radiator=22.222221"));
+    EXPECT_THAT(log(),
+                Contains(StartsWith("6 adjustSet: Attribute TEMPERATURE value 72 ")).Times(1));
+  });
+}
+
+TEST_F(SetTest, KeepsCelsiusOffTheMetricSystem) {
+  inProcessWithLocale(false, [this] {
+    const auto home =
+        useHome(HomeBuilder("Cottage").thermostat("Stove", {targetTemperature(21.0F)}));
+    set("TEMPERATURE", integerValue(22, "CELSIUS"));
+    EXPECT_THAT(written(*home), ElementsAre("Stove=22"));
+  });
 }
 
 TEST_F(SetTest, LogsAndSkipsWhatIsNoService) {

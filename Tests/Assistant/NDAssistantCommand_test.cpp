@@ -159,6 +159,13 @@ TEST_F(HandleCommandTest, SearchesAllOfOneHome) {
   EXPECT_THAT(log(), ElementsAre("6 Incoming Filter: "));
 }
 
+TEST_F(HandleCommandTest, SearchesAllOfOnePrimaryHome) {
+  useHome(HomeBuilder("Cottage").primary().light("Lamp"));
+  perform(makeCommand(Search(), {}));
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Cottage SUCCESS; Lamp SUCCESS"));
+  EXPECT_THAT(log(), ElementsAre("6 Incoming Filter: "));
+}
+
 TEST_F(HandleCommandTest, ComparesTheNumberOfHomesSigned) {
   useHome(HomeBuilder("Cottage"));
   const auto command = performed(makeCommand(Search(), {}));
