@@ -1,9 +1,11 @@
 # What every target of the project has in common.
 
 find_package(Threads REQUIRED)
+# Paths below the checkout count as relative, so that all checkouts share one cache.
 find_program(NIDUS_CCACHE ccache)
 if(NIDUS_CCACHE)
-  set(CMAKE_CXX_COMPILER_LAUNCHER ${NIDUS_CCACHE})
+  set(CMAKE_CXX_COMPILER_LAUNCHER
+    ${CMAKE_COMMAND} -E env CCACHE_BASEDIR=${PROJECT_SOURCE_DIR} CCACHE_NOHASHDIR=1 ${NIDUS_CCACHE})
 endif()
 
 set(NIDUS_SANITIZE "" CACHE STRING "Sanitizers of all targets, such as address,undefined")

@@ -56,8 +56,8 @@ CommandTest::~CommandTest() {
   NDPlatform::unregisterPlatform(TestPlatform::shared());
 }
 
-void CommandTest::useHomes(std::vector<std::shared_ptr<TestHome>> homes) {
-  platform().setHomes(std::move(homes));
+void CommandTest::useHomes(const std::vector<std::shared_ptr<TestHome>>& homes) {
+  platform().setHomes(homes);
 }
 
 std::shared_ptr<TestHome> CommandTest::useHome(HomeBuilder& builder) {

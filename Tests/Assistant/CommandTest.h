@@ -28,7 +28,7 @@ class CommandTest : public ::testing::Test {
   ~CommandTest() override;
 
   /// The homes that commands find from now on.
-  void useHomes(std::vector<std::shared_ptr<TestHome>> homes);
+  void useHomes(const std::vector<std::shared_ptr<TestHome>>& homes);
   /// The one home that commands find from now on.
   std::shared_ptr<TestHome> useHome(HomeBuilder& builder);
   std::shared_ptr<TestHome> useHome(HomeBuilder&& builder) { return useHome(builder); }
