@@ -3,9 +3,11 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <cstddef>
 #include <cstdint>
-#include <limits>
+#include <functional>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "Support/FreshProcess.h"
@@ -23,6 +25,14 @@ using ::testing::Pair;
 using ::testing::UnorderedElementsAre;
 
 constexpr const char* kDeveloperLevelKey = "NidusDeveloperLogLevel";
+
+constexpr std::size_t kThreadCount = 8;
+
+void onManyThreads(const std::function<void()>& work) {
+  std::vector<std::thread> threads;
+  for (std::size_t i = 0; i < kThreadCount; ++i) threads.emplace_back(work);
+  for (std::thread& thread : threads) thread.join();
+}
 
 struct Lamp {};
 std::string description(const Lamp& /*lamp*/) { return "a lamp"; }
@@ -97,6 +107,26 @@ TEST_F(WLOLogTest, ChangesAreHeardOnTheSharedQueue) {
     const auto& registration = platform().testNotifications().registrations().at(0);
     EXPECT_EQ(registration.name, "com.corvane.managedconfiguration.defaultsdidchange");
     EXPECT_EQ(registration.queue, platform().sharedQueue());
+  });
+}
+
+TEST_F(WLOLogTest, ManyThreadsOpenTheLogOnce) {
+  inFreshProcess([] {
+    onManyThreads([] {
+      if (WLOShouldLogAtLevel(4)) WLOLog(4, "hello", {});
+    });
+    EXPECT_EQ(systemLog().openings().size(), 1U);
+    EXPECT_EQ(systemLog().messages().size(), kThreadCount);
+  });
+}
+
+TEST_F(WLOLogTest, OneOfManyReadersSetsTheFilter) {
+  inFreshProcess([] {
+    EXPECT_EQ(threshold(), 4);
+    setPreference(kWLOLogLevelKey, 7);
+    onManyThreads(&notifyOfChange);
+    EXPECT_EQ(threshold(), 7);
+    EXPECT_THAT(systemLog().filterMasks(), ElementsAre(0x1F, 0xFF));
   });
 }
 
