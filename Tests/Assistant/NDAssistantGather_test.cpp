@@ -2,7 +2,9 @@
 
 #include <gmock/gmock.h>
 
+#include <atomic>
 #include <string>
+#include <thread>
 #include <vector>
 
 #include "Assistant/ObjectURL.h"
@@ -123,6 +125,19 @@ TEST_F(NDAssistantGatherTest, SecondStartReplacesTheFirst) {
   gather->startWithCompletionHandler(countingHandler());
   platform().runUntilIdle();
   EXPECT_THAT(counts_, ElementsAre(1));
+}
+
+TEST_F(NDAssistantGatherTest, UpdateAndStartAtOnceCallOnce) {
+  platform().setSilent(true);
+  useHome(HomeBuilder("Cabin"));
+  for (int i = 0; i < 100; ++i) {
+    const auto gather = NDAssistantGather::init();
+    std::atomic<int> calls = 0;
+    std::thread update([&gather] { gather->homeManagerDidUpdateHomes(gather->manager()); });
+    gather->startWithCompletionHandler([&calls](long) { ++calls; });
+    update.join();
+    EXPECT_EQ(calls, 1);
+  }
 }
 
 TEST_F(NDAssistantGatherTest, HandlerIsReleasedAfterItsCall) {
