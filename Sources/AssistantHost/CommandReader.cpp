@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <limits>
 #include <utility>
+#include <variant>
 #include <vector>
 
 #include "AssistantHost/JsonChoice.h"
@@ -60,9 +61,13 @@ std::shared_ptr<const VAHAFilter> filterFromJson(const JsonPlaced& placed) {
 }
 
 float floatFromJson(const JsonPlaced& placed) {
-  const NDValueRef number = placed.boxed();
-  if (!number->isFloating() && !number->isInteger()) placed.fail("expected a number");
-  return number->floatValue();
+  const auto& content = placed.value().content;
+  if (const auto* integer = std::get_if<std::int64_t>(&content)) {
+    return static_cast<float>(*integer);
+  }
+  const auto* number = std::get_if<float>(&content);
+  if (!number) placed.fail("expected a number");
+  return *number;
 }
 
 std::shared_ptr<VAHAValue> valueOfKind(std::string_view kind, const JsonPlaced& placed) {
