@@ -148,7 +148,10 @@ class CheckingHandler {
   bool parse_error(std::size_t, const std::string& token, const nlohmann::json::exception& error) {
     constexpr int kNumberOverflow = 406;
     if (error.id == kNumberOverflow) failBeyondRange(isInteger(token));
-    const std::string message = syntaxMessage(error.what());
+    std::string message = syntaxMessage(error.what());
+    if (isComplete() && message.find("expected end of input") == std::string::npos) {
+      message += "; expected end of input";
+    }
     if (isEmpty_ && message.find("unexpected end of input") != std::string::npos) {
       throw JsonError{"", "the document is empty"};
     }
@@ -156,6 +159,9 @@ class CheckingHandler {
   }
 
  private:
+  /// Whether the document has ended, so that what follows is too much.
+  [[nodiscard]] bool isComplete() const { return !isEmpty_ && path_.depth() == 0; }
+
   bool scalar(JsonValue value) {
     isEmpty_ = false;
     events_.scalar(std::move(value), path_);

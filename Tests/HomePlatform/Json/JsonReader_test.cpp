@@ -17,7 +17,9 @@
 namespace nidus {
 namespace {
 
+using testing::EndsWith;
 using testing::HasSubstr;
+using testing::Not;
 
 JsonError errorOf(const std::string& text) {
   try {
@@ -83,6 +85,13 @@ TEST(ParseJsonTest, RefusesWhatIsNoJson) {
     EXPECT_THAT(error.message, HasSubstr(message));
     EXPECT_EQ(error.place, "");
   }
+}
+
+TEST(ParseJsonTest, ExpectsNothingAfterTheDocument) {
+  for (const char* text : {"1 2", "{} x", "[] }", "null nul"}) {
+    EXPECT_THAT(errorOf(text).message, EndsWith("; expected end of input")) << text;
+  }
+  EXPECT_THAT(errorOf("[1, x").message, Not(HasSubstr("end of input")));
 }
 
 TEST(ParseJsonTest, LeavesReadTextOutOfMessages) {
