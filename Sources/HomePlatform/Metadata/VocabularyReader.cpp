@@ -200,7 +200,11 @@ Result<Vocabulary> loadVocabulary(const std::optional<std::filesystem::path>& pa
   Result<std::optional<std::string>> text = readFile(*path);
   if (!text) return text.failure();
   if (!*text) return builtInVocabulary();
-  return mergeVocabulary(builtInVocabulary(), **text, path->string());
+  Result<Vocabulary> merged = mergeVocabulary(builtInVocabulary(), **text, path->string());
+  if (merged) return merged;
+  Failure failure = merged.failure();
+  failure.message += "; correct the file or remove it";
+  return failure;
 }
 
 }  // namespace nidus

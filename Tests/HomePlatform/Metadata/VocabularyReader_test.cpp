@@ -8,6 +8,7 @@
 namespace nidus {
 namespace {
 
+using testing::EndsWith;
 using testing::HasSubstr;
 using testing::StartsWith;
 
@@ -143,6 +144,15 @@ TEST(VocabularyReaderTest, ReadsTheFileOfTheUser) {
   const auto vocabulary = loadVocabulary(folder.path() / "vocabulary.json");
   ASSERT_TRUE(vocabulary);
   EXPECT_EQ(vocabulary->units.back().assistantName, "K");
+}
+
+TEST(VocabularyReaderTest, NamesTheRemedyOfBadFiles) {
+  const TestFolder folder;
+  folder.write("vocabulary.json", "{}");
+  const auto vocabulary = loadVocabulary(folder.path() / "vocabulary.json");
+  ASSERT_FALSE(vocabulary);
+  EXPECT_EQ(vocabulary.failure().kind, Failure::Kind::badInput);
+  EXPECT_THAT(vocabulary.failure().message, EndsWith("; correct the file or remove it"));
 }
 
 }  // namespace
