@@ -14,6 +14,15 @@
 namespace nidus {
 namespace {
 
+constexpr const char kOptionsOfAll[] =
+    "The options of all commands, such as --data, are in nidus --help.";
+
+constexpr const char kFirstHelp[] =
+    "See it work with nidus demo; begin with nidus home import FILE.\n"
+    "The options may stand before or after a command. Each command has a help of its own:\n"
+    "nidus COMMAND --help\n\n"
+    "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform failed.";
+
 /// Declares a command to the parser of arguments.
 class ParserSyntax final : public CommandSyntax {
  public:
@@ -26,7 +35,7 @@ class ParserSyntax final : public CommandSyntax {
                          const std::string& details) override {
     CLI::App* below = app_.add_subcommand(name, help);
     below->fallthrough();
-    below->footer(details);
+    below->footer(details + (details.empty() ? "" : "\n\n") + kOptionsOfAll);
     app_.require_subcommand(1);
     below_.push_back(std::make_unique<ParserSyntax>(*below, chosen_));
     return *below_.back();
@@ -77,9 +86,11 @@ std::string commandOf(const CLI::App& app) {
 ExitStatus reportUsage(const CLI::App& app, const CLI::ParseError& error) {
   const auto unknown = app.remaining(true);
   const bool isCommandMissing = dynamic_cast<const CLI::RequiredError*>(&error) != nullptr;
-  const std::string reason = isCommandMissing && !unknown.empty()
-                                 ? "there is no command " + unknown.front()
-                                 : std::string(error.what());
+  std::string reason = error.what();
+  if (isCommandMissing && !unknown.empty()) {
+    const bool isOption = unknown.front().rfind('-', 0) == 0;
+    reason = (isOption ? "there is no option " : "there is no command ") + unknown.front();
+  }
   return report({Failure::Kind::badInput, reason + "; see " + commandOf(app) + " --help"});
 }
 
@@ -104,7 +115,7 @@ int runCommandLine(int argc, const char* const* argv) {
   std::signal(SIGPIPE, SIG_IGN);
   CLI::App app("Lets an assistant's commands act on a home.", "nidus");
   app.set_version_flag("--version", "nidus " NIDUS_VERSION);
-  app.footer("Each command has a help of its own: nidus COMMAND --help");
+  app.footer(kFirstHelp);
   Settings settings;
   std::function<ExitStatus()> chosen;
   ParserSyntax program(app, chosen);

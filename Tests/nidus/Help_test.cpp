@@ -14,9 +14,10 @@ struct HelpCase {
 TEST_F(ProgramTest, HelpsOnEachLevel) {
   const HelpCase table[] = {
       {{},
-       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo"}},
-      {{"home"}, {"import", "export", "show", "check"}},
-      {{"home", "import"}, {"FILE", "--merge"}},
+       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo",
+        "Exit status"}},
+      {{"home"}, {"import", "export", "show", "check", "--data"}},
+      {{"home", "import"}, {"FILE", "--merge", "--data"}},
       {{"home", "export"}, {"FILE"}},
       {{"home", "show"}, {"tree"}},
       {{"home", "check"}, {"FILE"}},
@@ -66,6 +67,11 @@ TEST_F(ProgramTest, RefusesBadUsageOnOneLine) {
     EXPECT_THAT(end.errors, IsOneFailure(""));
     EXPECT_THAT(end.errors, HasSubstr("--help"));
   }
+}
+
+TEST_F(ProgramTest, TellsUnknownOptionsFromUnknownCommands) {
+  EXPECT_THAT(runProgram({{"dance"}}).errors, HasSubstr("there is no command dance"));
+  EXPECT_THAT(runProgram({{"--dance"}}).errors, HasSubstr("there is no option --dance"));
 }
 
 TEST_F(ProgramTest, ReportsAnOutputThatIsFull) {
