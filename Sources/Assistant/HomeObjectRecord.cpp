@@ -1,5 +1,7 @@
 #include "Assistant/HomeObjectRecord.h"
 
+#include "PlatformModel/System/NDOneLine.h"
+
 namespace nidus {
 namespace {
 
@@ -19,7 +21,7 @@ void setUnlessEmpty(NDDictionary& dictionary, std::string_view key,
 class FieldWriter {
  public:
   void field(std::string_view key, const NDString& text) {
-    if (text) begin(key).append(text.view());
+    if (text) appendOnOneLine(begin(key), text.view());
   }
 
   void field(std::string_view key, const std::vector<NDString>& texts) {
@@ -27,7 +29,7 @@ class FieldWriter {
     begin(key) += '[';
     for (const NDString& text : texts) {
       if (&text != &texts.front()) out_ += ", ";
-      out_ += text.view();
+      appendOnOneLine(out_, text.view());
     }
     out_ += ']';
   }

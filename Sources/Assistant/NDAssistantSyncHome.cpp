@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <atomic>
 #include <chrono>
+#include <cstddef>
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <string>
@@ -185,11 +187,14 @@ void NDAssistantSyncHome::getChangeAfterAnchor_changeInfo(const NDString& anchor
 }
 
 void NDAssistantSyncHome::syncDidEnd() {
-  // Together, so that a late build task comes before or after all of them.
+  // Together, so that a late build task comes before or after all of them. What they held goes
+  // after the lock.
+  std::optional<Anchors> anchors;
+  std::optional<Entities> entities;
   const NDLock lock(mutex_);
   finalAnchor_ = nullptr;
-  postAnchors_.reset();
-  entities_.reset();
+  postAnchors_.swap(anchors);
+  entities_.swap(entities);
 }
 
 NDString NDAssistantSyncHome::calculateFinalAnchorForHomeObjects(
@@ -221,7 +226,7 @@ std::optional<NDAssistantSyncHome::Anchors> NDAssistantSyncHome::postAnchors() c
 }
 void NDAssistantSyncHome::setPostAnchors(std::optional<Anchors> anchors) {
   const NDLock lock(mutex_);
-  postAnchors_ = std::move(anchors);
+  postAnchors_.swap(anchors);
 }
 
 std::optional<NDAssistantSyncHome::Entities> NDAssistantSyncHome::entities() const {
@@ -230,7 +235,7 @@ std::optional<NDAssistantSyncHome::Entities> NDAssistantSyncHome::entities() con
 }
 void NDAssistantSyncHome::setEntities(std::optional<Entities> entities) {
   const NDLock lock(mutex_);
-  entities_ = std::move(entities);
+  entities_.swap(entities);
 }
 
 std::shared_ptr<NDWaitGroup> NDAssistantSyncHome::group() const {
@@ -239,7 +244,7 @@ std::shared_ptr<NDWaitGroup> NDAssistantSyncHome::group() const {
 }
 void NDAssistantSyncHome::setGroup(std::shared_ptr<NDWaitGroup> group) {
   const NDLock lock(mutex_);
-  sync_->group = std::move(group);
+  sync_->group.swap(group);
 }
 
 std::shared_ptr<NDAssistantGather> NDAssistantSyncHome::gather() const {
@@ -248,7 +253,7 @@ std::shared_ptr<NDAssistantGather> NDAssistantSyncHome::gather() const {
 }
 void NDAssistantSyncHome::setGather(std::shared_ptr<NDAssistantGather> gather) {
   const NDLock lock(mutex_);
-  sync_->gather = std::move(gather);
+  sync_->gather.swap(gather);
 }
 
 std::shared_ptr<NDQueue> NDAssistantSyncHome::queue() const {
@@ -257,7 +262,7 @@ std::shared_ptr<NDQueue> NDAssistantSyncHome::queue() const {
 }
 void NDAssistantSyncHome::setQueue(std::shared_ptr<NDQueue> queue) {
   const NDLock lock(mutex_);
-  queue_ = std::move(queue);
+  queue_.swap(queue);
 }
 
 std::shared_ptr<NDHomeManager> NDAssistantSyncHome::manager() const {
@@ -266,7 +271,7 @@ std::shared_ptr<NDHomeManager> NDAssistantSyncHome::manager() const {
 }
 void NDAssistantSyncHome::setManager(std::shared_ptr<NDHomeManager> manager) {
   const NDLock lock(mutex_);
-  manager_ = std::move(manager);
+  manager_.swap(manager);
 }
 
 }  // namespace nidus

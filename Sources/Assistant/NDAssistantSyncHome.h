@@ -20,8 +20,8 @@ namespace nidus {
 ///
 /// The operations of `AFSyncHandler` run on the assistant's thread; the begin blocks it for at most
 /// two seconds. Entities are built on the handler's serial queue, each sync by tasks of its own: a
-/// sync that is late never touches the lists of the next one. The properties may be read and set
-/// from any thread.
+/// sync that is late never touches the lists of the next one. The properties may be read from
+/// any thread, and set from any thread while no sync runs.
 ///
 ///     auto handler = NDAssistantSyncHome::init();
 ///     handler->beginSyncWithAnchor_validity_forKey_beginInfo(nullptr, nullptr,

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <atomic>
+#include <cassert>
 #include <limits>
 #include <memory>
 
@@ -75,7 +76,7 @@ void readLevel() {
 }
 
 void connect(NDPlatform& platform) {
-  connection = new Connection;
+  if (!connection) connection = new Connection;
   connection->client = platform.systemLog()->openClient(nullptr, kFacility, 0);
   readLevel();
   connection->changeRegistration = platform.notificationCenter()->registerForName_queue_handler(
@@ -127,15 +128,20 @@ void WLOArgument::appendTo(std::string& out) const {
 
 }  // namespace nidus
 
-bool WLOShouldLogAtLevel(int level) {
+// A host's logging must not end the host: what cannot be logged, for want of memory, is not logged.
+
+bool WLOShouldLogAtLevel(int level) try {
   return nidus::isConnected() && level <= nidus::currentLevel.load(std::memory_order_relaxed);
+} catch (...) {
+  return false;
 }
 
 void WLOLog(int level, const char* format, std::initializer_list<nidus::WLOArgument> arguments) {
   WLOLogV(level, format, {arguments.begin(), arguments.size()});
 }
 
-void WLOLogV(int level, const char* format, std::span<const nidus::WLOArgument> arguments) {
+void WLOLogV(int level, const char* format, std::span<const nidus::WLOArgument> arguments) try {
+  assert(level >= 0 && level <= 7);
   const auto platform = nidus::NDPlatform::registered();
   if (!platform) return;
   const auto message = platform->systemLog()->createMessage();
@@ -144,4 +150,6 @@ void WLOLogV(int level, const char* format, std::span<const nidus::WLOArgument> 
   message->set("Facility", nidus::kFacility);
   if (format) message->set("Message", nidus::formatted(format, arguments));
   if (nidus::isConnected()) nidus::connection->client->send(*message);
+} catch (...) {
+  return;
 }

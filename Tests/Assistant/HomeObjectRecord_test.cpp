@@ -72,6 +72,13 @@ TEST(HomeObjectRecordTest, DescriptionLeavesAbsentFieldsOut) {
   EXPECT_EQ(description(HomeObjectRecord()), "{}");
 }
 
+TEST(HomeObjectRecordTest, DescriptionKeepsToOneLine) {
+  HomeObjectRecord record;
+  record.objectName = "a\nb\r\\";
+  record.objectGroups = {"c\nd"};
+  EXPECT_EQ(description(record), R"({objectName: a\nb\r\\, objectGroups: [c\nd]})");
+}
+
 TEST(HomeObjectRecordTest, DescriptionJoinsTheRecordsOfAList) {
   HomeObjectRecord record;
   record.objectName = "Lamp";

@@ -42,7 +42,8 @@ inline constexpr const char kNDAssistantModuleABI[] =
 #undef ND_TEXT_OF
 
 /// What the module offers. The first two members keep their place for ever; a host reads them
-/// before it touches anything else. No operation throws; all may be called from any thread.
+/// before it touches anything else. None of its operations throws; all may be called from
+/// any thread. What they make reports failures as outcomes; running out of memory ends the process.
 struct NDAssistantModule {
   std::uint32_t interfaceVersion;  ///< `kNDAssistantModuleInterfaceVersion` of the module's build.
   const char* abi;                 ///< `kNDAssistantModuleABI` of the module's build.
@@ -56,12 +57,12 @@ struct NDAssistantModule {
   std::shared_ptr<AFSyncHandler> (*makeSyncHandler)(std::string& message);
   /// Takes a snapshot of the homes and gives its records, in dictionary form and in order, to
   /// `receive`, once, on a thread of the platform; without configured homes at once and empty.
-  /// False, with the reason in `message`, as above; `receive` is then dropped.
+  /// False, with the reason in `message`, as above; `receive` is then dropped. It must not throw.
   bool (*gatherRecords)(std::function<void(const NDDictionaryList& records)> receive,
                         std::string& message);
 };
 
-/// The name of the module's one entry, of type `NDAssistantModuleEntry`.
+/// The name of the module's one entry, of type `NDAssistantModuleEntryFunction`.
 inline constexpr const char kNDAssistantModuleEntryName[] = "NDAssistantModuleEntry";
 using NDAssistantModuleEntryFunction = const NDAssistantModule*();
 

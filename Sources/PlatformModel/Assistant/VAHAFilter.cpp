@@ -1,6 +1,7 @@
 #include "PlatformModel/Assistant/VAHAFilter.h"
 
 #include "PlatformModel/Assistant/VAHAConstants.h"
+#include "PlatformModel/System/NDOneLine.h"
 
 namespace nidus {
 namespace {
@@ -31,20 +32,8 @@ class FilterText {
 
   void addQuoted(std::string_view value) {
     text_ += '"';
-    for (const char c : value) addEscaped(c);
+    appendOnOneLine(text_, value, "\"");
     text_ += '"';
-  }
-
-  // A line break in a name must not break the line.
-  void addEscaped(char c) {
-    if (c == '\n') {
-      text_ += "\\n";
-    } else if (c == '\r') {
-      text_ += "\\r";
-    } else {
-      if (c == '"' || c == '\\') text_ += '\\';
-      text_ += c;
-    }
   }
 
   std::string text_;

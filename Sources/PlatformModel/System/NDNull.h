@@ -17,8 +17,9 @@ template <class Pointer, class Object, class Result, class... Parameters, class.
                               const Arguments&... arguments) {
   if (object) return ((*object).*read)(arguments...);
   if constexpr (std::is_reference_v<Result>) {
-    static const std::remove_cvref_t<Result> kNone{};
-    return kNone;
+    // Never destroyed: a platform's thread may still read while the process ends.
+    static const auto& none = *new const std::remove_cvref_t<Result>{};
+    return none;
   } else {
     return Result{};
   }
