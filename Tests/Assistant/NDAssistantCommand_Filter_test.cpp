@@ -100,7 +100,7 @@ TEST_F(FilterTest, KeepsObjectsOfTheHome) {
 
 TEST_F(FilterTest, ComparesHomeNamesExactly) {
   snapshot({serviceRecord("Lamp", "Chalet"), serviceRecord("Fan", "chalet"),
-            serviceRecord("Heater", "Ch\u00e2let")});
+            serviceRecord("Heater", "ch\u00e2let")});
   EXPECT_THAT(find({}, "chalet"), ElementsAre("Fan"));
 }
 

@@ -278,6 +278,13 @@ TEST_F(GetMetadataTest, FindsServicesByTheReadType) {
   EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Sensor SUCCESS TEMPERATURE"));
 }
 
+TEST_F(GetMetadataTest, LeavesOutOtherObjectsQuietly) {
+  useHome(HomeBuilder("Cottage").light("Lamp", {brightness(40)}).room("Hall"));
+  perform(makeCommand(Search(), {{.type = "GET_MAXIMUM", .attribute = "BRIGHTNESS"}}));
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS BRIGHTNESS=100 percentage"));
+  EXPECT_THAT(log(4), IsEmpty());
+}
+
 TEST_F(GetMetadataTest, LeavesOutServicesWithoutTheLimit) {
   useHome(HomeBuilder("Cottage")
               .light("Lamp", {brightness(40)})

@@ -201,6 +201,16 @@ TEST_F(UpdateTest, AcceptsOtherActionTypes) {
   EXPECT_THAT(written(*home), ElementsAre("Lamp=40"));
 }
 
+TEST_F(UpdateTest, KeepsResultsThatAreNoAnswer) {
+  useHome(HomeBuilder("Cottage").light("Lamp", {brightness(40)}));
+  const auto command = performed(makeCommand(nullptr, {}));
+  command->handleUpdateActionTypes_serviceType_forObjects_completionHandler(
+      makeAction({.type = "GET", .attribute = "BRIGHTNESS", .value = integerValue(7)}), nullptr,
+      command->allObjects(), handler());
+  runUntilIdle();
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS BRIGHTNESS=40 PERCENTAGE"));
+}
+
 TEST_F(UpdateTest, ReadsTheWriteTypeForTargetValue) {
   const auto home = useHome(HomeBuilder("Cottage").thermostat(
       "Stove", {currentTemperature(19.5F), targetTemperature(21.0F)}));
