@@ -146,7 +146,7 @@ class Caller {
     expect(textOf(replies[0], "commandOutcome") == outcome, what + ": outcome");
     expect(resultsOf(replies[0]).size() == results, what + ": number of results");
   }
-  auto lamp(NDString name) const {
+  [[nodiscard]] static auto lamp(NDString name) {
     return
         [name = std::move(name)](VAHASearchCriteriaFilter& filter) { filter.setServiceName(name); };
   }
@@ -275,11 +275,14 @@ TEST(LoadTest, EveryCommandAndSyncIsAnsweredAsItShould) {
   ASSERT_EQ(NDPlatform::registerPlatform(*platform), "");
 
   std::vector<Caller> callers;
-  for (std::size_t room = 0; room < kThreads; ++room)
+  callers.reserve(kThreads);
+  for (std::size_t room = 0; room < kThreads; ++room) {
     callers.emplace_back(room, commands / kThreads);
+  }
   std::atomic<std::size_t> running = kThreads;
   std::atomic<std::size_t> badSyncs = 0;
   std::vector<std::thread> threads;
+  threads.reserve(kThreads);
   const auto mainQueue = (*platform)->mainQueue();
   for (auto& caller : callers) {
     threads.emplace_back([&] {

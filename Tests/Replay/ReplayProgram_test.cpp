@@ -8,6 +8,7 @@
 
 #include "Replay/ReplayRun.h"
 #include "Replay/TranscriptComparison.h"
+#include "Support/TestFolder.h"
 
 namespace nidus {
 namespace {
@@ -35,7 +36,7 @@ void PrintTo(const BadScenario& scenario, std::ostream* out) { *out << scenario.
 class BadScenarioTest : public testing::TestWithParam<BadScenario> {};
 
 TEST_P(BadScenarioTest, EndsWithStatusTwoAndNoOutput) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const ReplayRun run = runReplay(folder.write("bad.json", GetParam().text));
   EXPECT_EQ(run.exitStatus, 2);
   EXPECT_THAT(run.output, IsEmpty());
@@ -108,14 +109,14 @@ std::string labelOf(const testing::TestParamInfo<BadScenario>& scenario) {
 INSTANTIATE_TEST_SUITE_P(Replay, BadScenarioTest, testing::ValuesIn(badScenarios()), labelOf);
 
 TEST(ReplayProgramTest, NamesThePlaceOfTheMistake) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const ReplayRun run = runReplay(
       folder.write("bad.json", scenarioWithSteps(R"({"export": {}}, {"sync": {"key": 5}})")));
   EXPECT_THAT(run.errors, HasSubstr("/steps/1/sync/key"));
 }
 
 TEST(ReplayProgramTest, RefusesAFileThatIsNotThere) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const ReplayRun run = runReplay(folder.path() / "nowhere.json");
   EXPECT_EQ(run.exitStatus, 2);
   EXPECT_THAT(run.output, IsEmpty());
@@ -123,7 +124,7 @@ TEST(ReplayProgramTest, RefusesAFileThatIsNotThere) {
 }
 
 TEST(ReplayProgramTest, NamesTheHomeFileThatIsNotThere) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const ReplayRun run = runReplay(folder.write(
       "scenario.json", R"({"format": "nidus-scenario/1", "homeFile": "away.json", "steps": []})"));
   EXPECT_EQ(run.exitStatus, 2);
@@ -132,7 +133,7 @@ TEST(ReplayProgramTest, NamesTheHomeFileThatIsNotThere) {
 }
 
 TEST(ReplayProgramTest, FindsTheHomeFileBesideTheScenario) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   folder.write("beach.json", kHome);
   const ReplayRun run = runReplay(folder.write(
       "scenario.json",
@@ -143,7 +144,7 @@ TEST(ReplayProgramTest, FindsTheHomeFileBesideTheScenario) {
 }
 
 TEST(ReplayProgramTest, NamesTheHomeFileThatIsWrong) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   folder.write("beach.json", R"({"format": "nidus-home/1", "homes": [{"name": "No UUID"}]})");
   const ReplayRun run = runReplay(folder.write(
       "scenario.json", R"({"format": "nidus-scenario/1", "homeFile": "beach.json", "steps": []})"));
@@ -152,7 +153,7 @@ TEST(ReplayProgramTest, NamesTheHomeFileThatIsWrong) {
 }
 
 TEST(ReplayProgramTest, AbortsOnAWrongSyncKey) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const ReplayRun run = runReplay(folder.write(
       "scenario.json",
       scenarioWithSteps(R"({"records": {}}, {"sync": {"key": "other"}}, {"records": {}})")));
@@ -170,7 +171,7 @@ TEST(ReplayProgramTest, AbortsOnAWrongSyncKey) {
 }
 
 TEST(ReplayProgramTest, AbortsOnAWrongKeyAfterAGoodSync) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const ReplayRun run = runReplay(folder.write(
       "scenario.json", scenarioWithSteps(R"({"sync": {"key": "com.corvane.nidus.name"}}, )"
                                          R"({"sync": {"key": "com.corvane.nidus.names"}})")));
@@ -179,7 +180,7 @@ TEST(ReplayProgramTest, AbortsOnAWrongKeyAfterAGoodSync) {
 }
 
 TEST(ReplayProgramTest, LeavesTheDataFolderAlone) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const auto data = folder.path() / "data";
   const ReplayRun run =
       runReplay(folder.write("scenario.json", scenarioWithSteps(R"({"records": {}})")),
@@ -191,11 +192,11 @@ TEST(ReplayProgramTest, LeavesTheDataFolderAlone) {
 TEST(ReplayProgramTest, TakesTheUnitsFromTheScenario) {
   for (const std::string name : {"read-temperature-metric", "write-temperature-non-metric"}) {
     for (const std::string locale : {"en_US.UTF-8", "de_DE.UTF-8"}) {
-      SCOPED_TRACE(name + " under " + locale);
+      SCOPED_TRACE(testing::Message() << name << " under " << locale);
       const auto file = std::filesystem::path(NIDUS_SCENARIOS) / name;
       const ReplayRun run = runReplay(file.string() + ".scenario.json", "LC_ALL=" + locale);
       const auto difference =
-          transcriptDifference(contentOf(file.string() + ".expected.jsonl"), run.output);
+          transcriptDifference(contentOfFile(file.string() + ".expected.jsonl"), run.output);
       EXPECT_FALSE(difference.has_value()) << difference.value_or("");
     }
   }

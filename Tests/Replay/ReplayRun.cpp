@@ -3,9 +3,8 @@
 #include <sys/wait.h>
 
 #include <cstdlib>
-#include <fstream>
-#include <iterator>
-#include <stdexcept>
+
+#include "Support/TestFolder.h"
 
 namespace nidus {
 namespace {
@@ -14,30 +13,8 @@ std::string quoted(const std::filesystem::path& path) { return "'" + path.string
 
 }  // namespace
 
-ScratchFolder::ScratchFolder() {
-  std::string name = (std::filesystem::temp_directory_path() / "nidus-replay-XXXXXX").string();
-  if (::mkdtemp(name.data()) == nullptr) throw std::runtime_error("no scratch folder: " + name);
-  path_ = name;
-}
-
-ScratchFolder::~ScratchFolder() {
-  std::error_code ignored;
-  std::filesystem::remove_all(path_, ignored);
-}
-
-std::filesystem::path ScratchFolder::write(const std::string& name,
-                                           std::string_view content) const {
-  std::ofstream(path_ / name, std::ios::binary) << content;
-  return path_ / name;
-}
-
-std::string contentOf(const std::filesystem::path& file) {
-  std::ifstream stream(file, std::ios::binary);
-  return {std::istreambuf_iterator<char>(stream), std::istreambuf_iterator<char>()};
-}
-
 ReplayRun runReplay(const std::filesystem::path& scenario, const std::string& environment) {
-  const ScratchFolder folder;
+  const TestFolder folder;
   const auto output = folder.path() / "output";
   const auto errors = folder.path() / "errors";
   // The shell is replaced by the program, so that the program's own end is seen.
@@ -48,8 +25,8 @@ ReplayRun runReplay(const std::filesystem::path& scenario, const std::string& en
   ReplayRun run;
   if (WIFEXITED(status)) run.exitStatus = WEXITSTATUS(status);
   if (WIFSIGNALED(status)) run.signal = WTERMSIG(status);
-  run.output = contentOf(output);
-  run.errors = contentOf(errors);
+  run.output = contentOfFile(output);
+  run.errors = contentOfFile(errors);
   return run;
 }
 

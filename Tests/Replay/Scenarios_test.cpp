@@ -9,6 +9,7 @@
 
 #include "Replay/ReplayRun.h"
 #include "Replay/TranscriptComparison.h"
+#include "Support/TestFolder.h"
 
 namespace nidus {
 namespace {
@@ -48,7 +49,7 @@ TEST_P(ScenarioTest, PrintsTheExpectedTranscript) {
   EXPECT_EQ(run.exitStatus, 0);
   EXPECT_EQ(run.errors, "");
   const auto difference =
-      transcriptDifference(contentOf(fileOf(GetParam(), kTranscriptEnding)), run.output);
+      transcriptDifference(contentOfFile(fileOf(GetParam(), kTranscriptEnding)), run.output);
   EXPECT_FALSE(difference.has_value()) << difference.value_or("");
 }
 

@@ -78,7 +78,8 @@ TEST(NDStringTest, EqualityComparesCodePoints) {
 }
 
 TEST(NDStringTest, NullEqualsNoCharacters) {
-  EXPECT_FALSE(NDString() == "");
+  const char* const noText = "";
+  EXPECT_FALSE(NDString() == noText);
   const std::string_view noCharacters;
   EXPECT_FALSE(NDString() == noCharacters);
   EXPECT_EQ(NDString(""), "");
