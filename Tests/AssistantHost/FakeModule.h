@@ -38,8 +38,7 @@ class FakeModule {
   static std::shared_ptr<AFServiceCommand> makeCommand(
       const VAHACommand& /*request*/,
       // NOLINTNEXTLINE(performance-unnecessary-value-param): the module's interface has it so
-      std::shared_ptr<NDAssistantCommandObserver> /*observer*/,
-      std::string& message) {
+      std::shared_ptr<NDAssistantCommandObserver> /*observer*/, std::string& message) {
     if (current->perform) return std::make_shared<Command>();
     message = "no platform is registered";
     return nullptr;
