@@ -91,8 +91,8 @@ void HomeCalls::read(const NDUUID& home, const NDArray<NDCharacteristic>& charac
   targets.reserve(asked.size());
   for (const auto& characteristic : asked) targets.push_back(addressOf(*characteristic));
   observe({PlatformCall::Kind::read, home, targets, {}, std::nullopt});
-  parts_.queue->async([self = shared_from_this(), home, asked = std::move(asked),
-                       targets = std::move(targets), completion = std::move(completion)]() mutable {
+  calls_.async([self = shared_from_this(), home, asked = std::move(asked),
+                targets = std::move(targets), completion = std::move(completion)]() mutable {
     const CurrentHome current = self->findHome(home);
     if (current.hasFailed) return respondSame(std::move(asked), kErrorNotKept, completion);
     if (answerAsHome(current.home.get(), &FaultData::read, completion)) return;
@@ -117,8 +117,8 @@ void HomeCalls::write(const NDUUID& home, std::vector<NDCharacteristicWriteReque
     asked.push_back(std::move(tuple.characteristic));
   }
   observe(call);
-  parts_.queue->async([self = shared_from_this(), home, asked = std::move(asked),
-                       values = std::move(values), completion = std::move(completion)]() mutable {
+  calls_.async([self = shared_from_this(), home, asked = std::move(asked),
+                values = std::move(values), completion = std::move(completion)]() mutable {
     const CurrentHome current = self->findHome(home);
     if (current.hasFailed) return respondSame(std::move(asked), kErrorNotKept, completion);
     if (answerAsHome(current.home.get(), &FaultData::write, completion)) return;
@@ -133,7 +133,7 @@ void HomeCalls::write(const NDUUID& home, std::vector<NDCharacteristicWriteReque
 void HomeCalls::execute(const NDUUID& home, const NDUUID& actionSet,
                         NDExecuteCompletion completion) {
   observe({PlatformCall::Kind::execute, home, {}, {}, actionSet});
-  parts_.queue->async(
+  calls_.async(
       [self = shared_from_this(), home, actionSet, completion = std::move(completion)]() mutable {
         self->runScene(home, actionSet, std::move(completion));
       });

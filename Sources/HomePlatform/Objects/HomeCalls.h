@@ -9,6 +9,7 @@
 #include "HomePlatform/PlatformCall.h"
 #include "PlatformModel/Home/NDHome.h"
 #include "PlatformModel/System/NDQueue.h"
+#include "PlatformModel/System/NDSerialQueue.h"
 
 namespace nidus {
 
@@ -24,10 +25,11 @@ class HomeCalls : public std::enable_shared_from_this<HomeCalls> {
     std::function<void(const PlatformCall&)> observer;
     std::function<void(const Failure&)> reportFailure;
   };
-  explicit HomeCalls(Parts parts) : parts_(std::move(parts)) {}
+  explicit HomeCalls(Parts parts)
+      : parts_(std::move(parts)), calls_("com.corvane.nidus.home-calls", parts_.queue) {}
 
-  /// Each returns at once; its completion runs on the queue, exactly once, or is destroyed when the
-  /// queue is shut down.
+  /// Each returns at once; calls reach the driver in the order in which they were made. The
+  /// completion runs on the queue, exactly once, or is destroyed when the queue is shut down.
   void read(const NDUUID& home, const NDArray<NDCharacteristic>& characteristics,
             NDBatchCompletion completion);
   void write(const NDUUID& home, std::vector<NDCharacteristicWriteRequestTuple> writes,
@@ -42,6 +44,7 @@ class HomeCalls : public std::enable_shared_from_this<HomeCalls> {
   void runScene(const NDUUID& home, const NDUUID& actionSet, NDExecuteCompletion completion) const;
 
   const Parts parts_;
+  NDSerialQueue calls_;
 };
 
 }  // namespace nidus

@@ -67,14 +67,4 @@ Status prepareDatabaseFile(const fs::path& file) {
                  "give yourself write permission on the file");
 }
 
-FolderLock::FolderLock(const fs::path& folder)
-    : folder_(::open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC)) {
-  while (folder_ >= 0 && ::flock(folder_, LOCK_EX) != 0 && errno == EINTR) {
-  }
-}
-
-FolderLock::~FolderLock() {
-  if (folder_ >= 0) ::close(folder_);
-}
-
 }  // namespace nidus

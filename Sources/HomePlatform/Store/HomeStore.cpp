@@ -7,6 +7,7 @@
 #include "HomePlatform/Store/HomeInserter.h"
 #include "HomePlatform/Store/HomeLoader.h"
 #include "HomePlatform/Store/Schema.h"
+#include "HomePlatform/System/DataFolder.h"
 #include "PlatformModel/System/NDMutex.h"
 
 namespace nidus {
@@ -199,7 +200,10 @@ Result<std::unique_ptr<HomeStore>> HomeStore::open(const std::optional<std::file
                                                    std::chrono::milliseconds lockTimeout) {
   if (!file) return openStore(Database::kInMemory, "the database in memory", false, lockTimeout);
   if (Status failed = prepareDatabaseFile(*file)) return *failed;
-  const FolderLock lock(file->parent_path());
+  // One process at a time makes or migrates the databases of a folder.
+  const auto folder = file->parent_path();
+  const Result<FolderLock> lock = FolderLock::take(folder.empty() ? "." : folder);
+  if (!lock) return lock.failure();
   return openStore(file->string(), file->string(), true, lockTimeout);
 }
 

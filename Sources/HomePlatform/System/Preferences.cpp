@@ -6,6 +6,9 @@
 namespace nidus {
 namespace {
 
+/// Differs from the stamp of any file, and of none: the next reading looks at the file.
+constexpr const char* kNoStamp = "not read";
+
 void applyChange(JsonValue::Object& values, const std::string& key, const JsonValue& value) {
   const auto found = std::find_if(values.begin(), values.end(),
                                   [&key](const auto& member) { return member.first == key; });
@@ -102,7 +105,7 @@ Status Preferences::change(const std::map<std::string, JsonValue>& changes) {
   if (!written) return written.failure();
   const NDLock lock(mutex_);
   content_ = std::move(*written);
-  stamp_.clear();
+  stamp_ = kNoStamp;
   return std::nullopt;
 }
 

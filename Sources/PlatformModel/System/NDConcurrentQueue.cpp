@@ -3,6 +3,7 @@
 #include <cassert>
 #include <condition_variable>
 #include <deque>
+#include <system_error>
 #include <thread>
 #include <utility>
 #include <vector>
@@ -21,6 +22,7 @@ struct NDConcurrentQueue::State {
   void waitUntilIdle();
   std::deque<NDTask> close();
   std::vector<std::thread> takeThreads();
+  static void startThread(const std::shared_ptr<State>& state) ND_REQUIRES(state->mutex);
 
   const std::size_t width;
   NDMutex mutex;
@@ -88,6 +90,15 @@ std::vector<std::thread> NDConcurrentQueue::State::takeThreads() {
   return std::exchange(threads, {});
 }
 
+/// A machine that has no thread left to give costs speed, not work, as long as there is one.
+void NDConcurrentQueue::State::startThread(const std::shared_ptr<State>& state) {
+  try {
+    state->threads.emplace_back([state] { State::work(state); });
+  } catch (const std::system_error&) {
+    if (state->threads.empty()) throw;
+  }
+}
+
 NDConcurrentQueue::NDConcurrentQueue(std::size_t width) : state_(std::make_shared<State>(width)) {}
 
 NDConcurrentQueue::~NDConcurrentQueue() {
@@ -101,9 +112,7 @@ void NDConcurrentQueue::async(NDTask task) {
   const NDLock lock(state_->mutex);
   if (state_->isShutDown) return;
   const bool isThreadMissing = state_->tasks.size() >= state_->waitingThreads;
-  if (isThreadMissing && state_->threads.size() < state_->width) {
-    state_->threads.emplace_back([state = state_] { State::work(state); });
-  }
+  if (isThreadMissing && state_->threads.size() < state_->width) State::startThread(state_);
   state_->tasks.push_back(std::move(task));
   state_->workAdded.notify_one();
 }

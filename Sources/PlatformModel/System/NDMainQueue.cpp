@@ -2,6 +2,8 @@
 
 #include <utility>
 
+#include "PlatformModel/System/NDDeliveryHold.h"
+
 namespace nidus {
 
 NDMainQueue::~NDMainQueue() {
@@ -37,7 +39,9 @@ void NDMainQueue::runUntil(const std::function<bool()>& isDone) {
   for (;;) {
     const std::size_t wakesSeen = wakes();
     if (isDone()) return;
-    if (!runOne()) waitForWorkOrWake(wakesSeen);
+    if (runOne()) continue;
+    NDDeliveryHold::releaseForWait();
+    waitForWorkOrWake(wakesSeen);
   }
 }
 
@@ -48,11 +52,14 @@ void NDMainQueue::wake() {
 }
 
 void NDMainQueue::setWakeHandler(std::function<void()> handler) {
+  std::function<void()> wakeNow;
   {
     const NDLock lock(mutex_);
+    if (!tasks_.empty()) wakeNow = handler;
     wakeHandler_.swap(handler);
   }
-  // The earlier handler is destroyed here, without the lock.
+  // The earlier handler is destroyed by the caller's return, without the lock.
+  if (wakeNow) wakeNow();
 }
 
 bool NDMainQueue::take(NDTask& task) {

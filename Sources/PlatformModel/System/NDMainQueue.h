@@ -43,7 +43,8 @@ class ND_EXPORT NDMainQueue final : public NDQueue {
   void wake();
 
   /// Sets what is called, on the adding thread and without a lock, after work was added to an empty
-  /// queue; an empty handler removes it.
+  /// queue, and at once when there is work already; an empty handler removes it. A thread that adds
+  /// work at that moment may still call the earlier one, which therefore owns what it uses.
   void setWakeHandler(std::function<void()> handler);
 
  private:

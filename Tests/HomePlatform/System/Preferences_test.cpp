@@ -134,6 +134,13 @@ TEST_F(PreferencesTest, ChangeKeepsOtherKeysInOrder) {
                                                 "n": true})"));
 }
 
+TEST_F(PreferencesTest, SeesRemovalRightAfterChange) {
+  open(R"({})");
+  EXPECT_FALSE(preferences_->change({{"yes", JsonValue{true}}}));
+  std::filesystem::remove(folder_.path() / kFile);
+  EXPECT_FALSE(boolean("yes").keyExistsAndIsValid);
+}
+
 TEST_F(PreferencesTest, ChangeStartsFromTheFile) {
   open(R"({})");
   folder_.write(kFile, R"({"other": 1})");

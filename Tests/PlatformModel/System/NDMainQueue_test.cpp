@@ -8,6 +8,8 @@
 #include <string>
 #include <thread>
 
+#include "PlatformModel/System/NDDeliveryHold.h"
+
 namespace nidus {
 namespace {
 
@@ -68,6 +70,15 @@ TEST_F(NDMainQueueTest, WakesOnceUntilEmptyAgain) {
   EXPECT_EQ(wakes, 2);
 }
 
+TEST_F(NDMainQueueTest, NewWakeHandlerHearsOfWorkThatWaits) {
+  int wakes = 0;
+  add("a");
+  queue_.setWakeHandler([&wakes] { ++wakes; });
+  EXPECT_EQ(wakes, 1);
+  add("b");
+  EXPECT_EQ(wakes, 1);
+}
+
 TEST_F(NDMainQueueTest, WakeHandlerMayUseTheQueue) {
   queue_.setWakeHandler([this] { queue_.drain(); });
   add("a");
@@ -100,6 +111,15 @@ TEST_F(NDMainQueueTest, RunUntilWaitsForWork) {
   queue_.runUntil([this] { return ran_.size() == 100; });
   adder.join();
   EXPECT_EQ(queue_.drain(), 0U);
+}
+
+TEST_F(NDMainQueueTest, RunUntilLetsHeldDeliveriesGo) {
+  const NDDeliveryHold hold;
+  bool isDelivered = false;
+  NDDeliveryHold::whenReleased(
+      [this, &isDelivered] { queue_.async([&isDelivered] { isDelivered = true; }); });
+  queue_.runUntil([&isDelivered] { return isDelivered; });
+  EXPECT_TRUE(isDelivered);
 }
 
 TEST_F(NDMainQueueTest, WakeMakesRunUntilAskAgain) {
