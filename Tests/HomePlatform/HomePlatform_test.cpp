@@ -396,24 +396,6 @@ TEST(HomePlatformTest, DrainSeesTheLastOfAChain) {
   }
 }
 
-TEST(HomePlatformTest, KeepsTheOrderOfWrites) {
-  constexpr int kWrites = 100;
-  const OpenPlatform platform({});
-  ASSERT_FALSE(platform->importHomes({sampleHome()}, false));
-  const auto home = platform.homes()[0];
-  const auto lamp = characteristicAt(home, brightnessAddress());
-  std::vector<std::int64_t> answered(kWrites);
-  for (int level = 0; level < kWrites; ++level) {
-    home->writeCharacteristicValues_withCompletionHandler(
-        {{lamp, NDValue::integer(level)}}, [&answered, level](const auto& error, const auto& all) {
-          answered[static_cast<std::size_t>(level)] = !error && all.size() == 1;
-        });
-  }
-  platform->drain();
-  EXPECT_THAT(answered, testing::Each(1));
-  EXPECT_EQ(lamp->value()->integerValue(), kWrites - 1);
-}
-
 TEST(HomePlatformTest, ShutsDownWhileBatchesRun) {
   for (int round = 0; round < 20; ++round) {
     const OpenPlatform platform({});
