@@ -18,7 +18,6 @@ class TestFolder {
   /// The path of a file in the folder, as text.
   [[nodiscard]] std::string file(const std::string& name) const { return (path_ / name).string(); }
   /// Makes or replaces a file and gives its path.
-  // NOLINTNEXTLINE(modernize-use-nodiscard): some tests need only the file.
   std::string write(const std::string& name, std::string_view content) const;
 
  private:

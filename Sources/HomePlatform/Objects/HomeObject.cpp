@@ -26,7 +26,7 @@ HomeObject::~HomeObject() = default;
 void HomeObject::readCharacteristicValues_withCompletionHandler(
     NDArray<NDCharacteristic> characteristics, NDBatchCompletion completion) {
   if (const auto calls = calls_.lock()) {
-    calls->read(uuid(), std::move(characteristics), std::move(completion));
+    calls->read(uuid(), characteristics, std::move(completion));
   }
 }
 

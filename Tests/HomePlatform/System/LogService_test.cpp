@@ -99,7 +99,8 @@ class JournalTest : public testing::Test {
     sockaddr_un address = {};
     address.sun_family = AF_UNIX;
     std::strncpy(address.sun_path, path_.c_str(), sizeof address.sun_path - 1);
-    ::bind(socket_.get(), reinterpret_cast<const sockaddr*>(&address), sizeof address);
+    const auto* const name = reinterpret_cast<const sockaddr*>(&address);
+    EXPECT_EQ(::bind(socket_.get(), name, sizeof address), 0);
   }
   [[nodiscard]] std::string receive() const {
     char datagram[4096];

@@ -81,6 +81,7 @@ TEST(NDStringTest, NullEqualsNoCharacters) {
   const char* const noText = "";
   EXPECT_FALSE(NDString() == noText);
   const std::string_view noCharacters;
+  // NOLINTNEXTLINE(readability-container-size-empty): the comparison is what is tested
   EXPECT_FALSE(NDString() == noCharacters);
   EXPECT_EQ(NDString(""), "");
 }
