@@ -26,7 +26,7 @@ namespace nidus {
 
 /// One line that starts with "nidus: " and `start`, and its end.
 MATCHER_P(IsOneFailure, start, "") {
-  const std::string text = arg;
+  const std::string& text = arg;
   const std::string whole = std::string("nidus: ") + start;
   return text.compare(0, whole.size(), whole) == 0 && text.find('\n') == text.size() - 1;
 }
