@@ -40,7 +40,8 @@ struct HomePlatformOptions {
   std::function<void(const NDSystemLogMessage&)> logSink = nullptr;
   /// Hears of each failure of the platform after it was opened, such as a database that can no
   /// longer be read: on any thread, once where it happened. What failed is answered all the same,
-  /// with no homes or with errors. Empty writes a line to standard error.
+  /// with no homes or with errors. It must neither log through the plug-in nor call the platform.
+  /// Empty writes a line to standard error.
   std::function<void(const Failure&)> failureHandler = nullptr;
   /// Hears of each call on a home, before it is answered; may be empty. On any thread.
   std::function<void(const PlatformCall&)> callObserver = nullptr;
