@@ -24,6 +24,9 @@ class SilentSync final : public AFSyncHandler {
   void syncDidEnd() override {}
 };
 
+// The module's interface gives the types of the arguments.
+// NOLINTBEGIN(performance-unnecessary-value-param)
+
 std::shared_ptr<AFServiceCommand> makeCommand(
     const VAHACommand& /*request*/, std::shared_ptr<NDAssistantCommandObserver> /*observer*/,
     std::string& /*message*/) {
@@ -38,6 +41,8 @@ bool gatherRecords(std::function<void(const NDDictionaryList& records)> /*receiv
                    std::string& /*message*/) {
   return true;
 }
+
+// NOLINTEND(performance-unnecessary-value-param)
 
 }  // namespace
 }  // namespace nidus

@@ -28,10 +28,10 @@ class DataFolderTest : public ProgramTest {
   /// Where the database is when only these variables are set.
   void expectDatabase(const std::map<std::string, std::optional<std::string>>& environment,
                       const std::string& file) {
-    ProgramStart export_{{"home", "export"}};
-    export_.environment = {{"NIDUS_DATA", {}}, {"XDG_DATA_HOME", {}}, {"HOME", {}}};
-    for (const auto& [name, value] : environment) export_.environment[name] = value;
-    const ProgramEnd end = runProgram(export_);
+    ProgramStart exporting{{"home", "export"}};
+    exporting.environment = {{"NIDUS_DATA", {}}, {"XDG_DATA_HOME", {}}, {"HOME", {}}};
+    for (const auto& [name, value] : environment) exporting.environment[name] = value;
+    const ProgramEnd end = runProgram(exporting);
     EXPECT_EQ(end.exitStatus, 0) << end.errors;
     EXPECT_TRUE(std::filesystem::exists(folder_.path() / file));
   }
@@ -70,9 +70,9 @@ TEST_F(DataFolderTest, IgnoresARelativeDataFolder) {
 }
 
 TEST_F(DataFolderTest, MustBeKnown) {
-  ProgramStart export_{{"home", "export"}};
-  export_.environment = {{"NIDUS_DATA", ""}, {"XDG_DATA_HOME", {}}, {"HOME", {}}};
-  const ProgramEnd end = runProgram(export_);
+  ProgramStart exporting{{"home", "export"}};
+  exporting.environment = {{"NIDUS_DATA", ""}, {"XDG_DATA_HOME", {}}, {"HOME", {}}};
+  const ProgramEnd end = runProgram(exporting);
   EXPECT_EQ(end.exitStatus, 2);
   EXPECT_THAT(end.errors, IsOneFailure("no data folder is known"));
 }

@@ -10,8 +10,6 @@
 #include <csignal>
 #include <stdexcept>
 
-extern char** environ;
-
 namespace nidus {
 namespace {
 
