@@ -52,12 +52,13 @@ class HomeBuilder {
  private:
   NDUUID nextUUID();
 
+  // First, because making the default room counts already.
+  std::uint32_t objectCount_ = 0;
+  std::int64_t characteristicCount_ = 0;
   std::shared_ptr<TestHome> home_;
   std::shared_ptr<NDRoom> room_;
   std::shared_ptr<TestAccessory> accessory_;
   std::shared_ptr<TestService> service_;
-  std::uint32_t objectCount_ = 0;
-  std::int64_t characteristicCount_ = 0;
 };
 
 }  // namespace nidus
