@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "HomePlatform/Json/JsonValue.h"
+#include "HomePlatform/Metadata/Vocabulary.h"
 #include "HomePlatform/PlatformCall.h"
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
@@ -64,6 +65,8 @@ class HomePlatform : public NDPlatform {
   /// The homes as the database has them now.
   [[nodiscard]] virtual Result<std::vector<HomeData>> exportHomes() = 0;
 
+  /// The words that this platform knows, the user's own included; valid as long as the platform.
+  [[nodiscard]] virtual const Vocabulary& vocabulary() const noexcept = 0;
   virtual void setLocked(bool locked) = 0;
   /// Managers that are created from then on never report their homes, or do again.
   virtual void setSilent(bool silent) = 0;

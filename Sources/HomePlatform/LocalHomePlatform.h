@@ -50,6 +50,9 @@ class LocalHomePlatform final : public HomePlatform {
 
   [[nodiscard]] Status importHomes(const std::vector<HomeData>& homes, bool merge) override;
   [[nodiscard]] Result<std::vector<HomeData>> exportHomes() override;
+  [[nodiscard]] const Vocabulary& vocabulary() const noexcept override {
+    return mapper_->vocabulary();
+  }
   void setLocked(bool locked) override { deviceLock_->setLocked(locked); }
   void setSilent(bool silent) override { isSilent_.store(silent); }
   [[nodiscard]] Status changePreferences(const std::map<std::string, JsonValue>& changes) override;

@@ -8,8 +8,8 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
-#include "nidus/Settings.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
@@ -54,6 +54,10 @@ class ParserSyntax final : public CommandSyntax {
                         const std::string& help) override {
     app_.add_option(name, target, help)->option_text(" ")->required();
   }
+  void requiredArguments(const std::string& name, std::vector<std::string>& target,
+                         const std::string& help) override {
+    app_.add_option(name, target, help)->option_text("...")->required();
+  }
   void run(std::function<ExitStatus()> action) override {
     app_.callback([this, action = std::move(action)] { chosen_ = action; });
   }
@@ -64,15 +68,15 @@ class ParserSyntax final : public CommandSyntax {
   std::vector<std::unique_ptr<ParserSyntax>> below_;
 };
 
-void declareProgram(CommandSyntax& program, Settings& settings) {
-  program.option("--data", "DIR", settings.dataFolder,
+void declareProgram(CommandSyntax& program, Workspace& workspace) {
+  program.option("--data", "DIR", workspace.settings().dataFolder,
                  "The folder of the homes and preferences (else NIDUS_DATA, else nidus in the "
                  "user's data folder)");
-  program.flag("--locked", settings.isLocked, "The device is locked");
-  declareHome(program, settings);
-  declarePerform(program, settings);
-  declareSync(program, settings);
-  declareRecords(program, settings);
+  program.flag("--locked", workspace.settings().isLocked, "The device is locked");
+  declareHome(program, workspace);
+  declarePerform(program, workspace);
+  declareSync(program, workspace);
+  declareRecords(program, workspace);
   declareReplay(program);
   declareDemo(program);
 }
@@ -116,10 +120,10 @@ int runCommandLine(int argc, const char* const* argv) {
   CLI::App app("Lets an assistant's commands act on a home.", "nidus");
   app.set_version_flag("--version", "nidus " NIDUS_VERSION);
   app.footer(kFirstHelp);
-  Settings settings;
+  Workspace workspace;
   std::function<ExitStatus()> chosen;
   ParserSyntax program(app, chosen);
-  declareProgram(program, settings);
+  declareProgram(program, workspace);
   return static_cast<int>(parseAndRun(app, argc, argv, chosen));
 }
 

@@ -2,6 +2,7 @@
 
 #include <functional>
 #include <string>
+#include <vector>
 
 #include "nidus/ExitStatus.h"
 
@@ -33,6 +34,9 @@ class CommandSyntax {
   virtual void argument(const std::string& name, std::string& target, const std::string& help) = 0;
   virtual void requiredArgument(const std::string& name, std::string& target,
                                 const std::string& help) = 0;
+  /// Adds an argument of one word or more, all of them to the end.
+  virtual void requiredArguments(const std::string& name, std::vector<std::string>& target,
+                                 const std::string& help) = 0;
   /// Sets what runs when this command is the one that was given.
   virtual void run(std::function<ExitStatus()> action) = 0;
 };

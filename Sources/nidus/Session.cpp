@@ -1,5 +1,6 @@
 #include "nidus/Session.h"
 
+#include <functional>
 #include <utility>
 
 #include "AssistantHost/AssistantModule.h"
@@ -7,40 +8,37 @@
 
 namespace nidus {
 
-Result<std::unique_ptr<Session>> Session::open(const Settings& settings) {
-  auto options = platformOptionsOf(settings);
-  if (!options) return options.failure();
-  return open(std::move(*options));
-}
-
 Result<std::unique_ptr<Session>> Session::open(HomePlatformOptions options) {
-  const auto module = openOwnModule();
-  if (!module) return module.failure();
   const auto hasFailed = std::make_shared<std::atomic<bool>>(false);
   options.failureHandler = [hasFailed](const Failure& failure) {
     report(failure);
     hasFailed->store(true);
   };
+  const bool drainsOnCaller = options.drainsOnCaller;
   auto platform = RegisteredPlatform::open(std::move(options));
   if (!platform) return platform.failure();
-  return std::unique_ptr<Session>(new Session(**module, std::move(*platform), hasFailed));
+  return std::unique_ptr<Session>(new Session(std::move(*platform), hasFailed, drainsOnCaller));
 }
 
-Session::Session(const NDAssistantModule& module, std::unique_ptr<RegisteredPlatform> platform,
-                 FailureMark hasFailed)
+Session::Session(std::unique_ptr<RegisteredPlatform> platform, FailureMark hasFailed,
+                 bool drainsOnCaller)
     : hasFailed_(std::move(hasFailed)),
-      module_(module),
       platform_(std::move(platform)),
-      runner_(module_, platform_->platform()->mainQueue()) {}
+      drainsOnCaller_(drainsOnCaller) {}
+
+Status Session::openModule() {
+  if (module_) return std::nullopt;
+  const auto module = openOwnModule();
+  if (!module) return module.failure();
+  module_ = *module;
+  std::function<void()> drain;
+  if (drainsOnCaller_) drain = [this] { platform().drain(); };
+  runner_.emplace(*module_, platform().mainQueue(), std::move(drain));
+  return std::nullopt;
+}
 
 ExitStatus Session::statusAfter(ExitStatus status) const {
   return hasFailed_->load() ? ExitStatus::platformFailed : status;
-}
-
-Result<std::unique_ptr<RegisteredPlatform>> openPlatform(const Settings& settings) {
-  auto options = platformOptionsOf(settings);
-  if (!options) return options.failure();
-  return RegisteredPlatform::open(std::move(*options));
 }
 
 Result<const NDAssistantModule*> openOwnModule() {

@@ -30,6 +30,9 @@ class MetadataMapper final : public NDNAPMetadata {
   [[nodiscard]] NDValueRef mapToAssistantCharacteristicValue_name(
       const NDValueRef& value, const NDString& name) const override;
 
+  /// The tables, for those who list them.
+  [[nodiscard]] const Vocabulary& vocabulary() const noexcept { return vocabulary_; }
+
   /// The type whose characteristic on the same service follows what is written to one of type
   /// `writtenType`; null when none does.
   [[nodiscard]] NDString followingType(const NDString& writtenType) const;

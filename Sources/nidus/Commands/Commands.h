@@ -3,18 +3,18 @@
 namespace nidus {
 
 class CommandSyntax;
-struct Settings;
+class Workspace;
 
-/// The commands of the program. Each is declared by a unit of its own; `settings` are read when the
-/// command runs and must live until then.
-void declareHome(CommandSyntax& program, const Settings& settings);
-void declareHomeImport(CommandSyntax& home, const Settings& settings);
-void declareHomeExport(CommandSyntax& home, const Settings& settings);
-void declareHomeShow(CommandSyntax& home, const Settings& settings);
+/// The commands of the program. Each is declared by a unit of its own; `workspace` is used when
+/// the command runs and must live until then.
+void declareHome(CommandSyntax& program, Workspace& workspace);
+void declareHomeImport(CommandSyntax& home, Workspace& workspace);
+void declareHomeExport(CommandSyntax& home, Workspace& workspace);
+void declareHomeShow(CommandSyntax& home, Workspace& workspace);
 void declareHomeCheck(CommandSyntax& home);
-void declarePerform(CommandSyntax& program, const Settings& settings);
-void declareSync(CommandSyntax& program, const Settings& settings);
-void declareRecords(CommandSyntax& program, const Settings& settings);
+void declarePerform(CommandSyntax& program, Workspace& workspace);
+void declareSync(CommandSyntax& program, Workspace& workspace);
+void declareRecords(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
 

@@ -98,8 +98,11 @@ ExitStatus demonstrate() {
   options.dataFolder = folder->path();
   // The expected temperatures are in Celsius, wherever this runs.
   options.metric = true;
+  // Two replies to one command come in one order.
+  options.drainsOnCaller = true;
   const auto session = Session::open(std::move(options));
   if (!session) return report(session.failure());
+  if (auto failure = (*session)->openModule()) return report(*failure);
   Demonstration demonstration(**session);
   if (auto failure = demonstration.run()) return report(*failure);
   return (*session)->statusAfter(demonstration.differences() == 0 ? ExitStatus::success

@@ -3,11 +3,11 @@
 
 namespace nidus {
 
-void declareHome(CommandSyntax& program, const Settings& settings) {
+void declareHome(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& home = program.command("home", "Reads, shows and replaces the homes", "");
-  declareHomeImport(home, settings);
-  declareHomeExport(home, settings);
-  declareHomeShow(home, settings);
+  declareHomeImport(home, workspace);
+  declareHomeExport(home, workspace);
+  declareHomeShow(home, workspace);
   declareHomeCheck(home);
 }
 

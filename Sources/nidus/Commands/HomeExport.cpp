@@ -5,24 +5,24 @@
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/FileReplacement.h"
-#include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
 
-Result<std::string> exportedDocument(const Settings& settings) {
-  const auto registered = openPlatform(settings);
-  if (!registered) return registered.failure();
-  const auto homes = (*registered)->platform()->exportHomes();
+Result<std::string> exportedDocument(Workspace& workspace) {
+  const auto session = workspace.home();
+  if (!session) return session.failure();
+  const auto homes = (*session)->platform().exportHomes();
   if (!homes) return homes.failure();
   std::ostringstream document;
   writeHomeDocument(document, *homes, true);
   return document.str();
 }
 
-ExitStatus exportHomes(const std::string& file, const Settings& settings) {
-  const auto document = exportedDocument(settings);
+ExitStatus exportHomes(const std::string& file, Workspace& workspace) {
+  const auto document = exportedDocument(workspace);
   if (!document) return report(document.failure());
   if (file == "-") return printText(*document);
   const auto failure = replaceFile(file, *document);
@@ -31,13 +31,13 @@ ExitStatus exportHomes(const std::string& file, const Settings& settings) {
 
 }  // namespace
 
-void declareHomeExport(CommandSyntax& home, const Settings& settings) {
+void declareHomeExport(CommandSyntax& home, Workspace& workspace) {
   const auto file = std::make_shared<std::string>("-");
   CommandSyntax& syntax =
       home.command("export", "Writes all homes as a document",
                    "A file is replaced whole or not at all. The document can be imported again.");
   syntax.argument("FILE", *file, "Where to write; standard output when it is left out or -");
-  syntax.run([file, &settings] { return exportHomes(*file, settings); });
+  syntax.run([file, &workspace] { return exportHomes(*file, workspace); });
 }
 
 }  // namespace nidus

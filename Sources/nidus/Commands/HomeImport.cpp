@@ -3,8 +3,8 @@
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/Commands/HomeInput.h"
-#include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
@@ -14,12 +14,12 @@ struct ImportOptions {
   bool merges = false;
 };
 
-ExitStatus importHomes(const ImportOptions& options, const Settings& settings) {
+ExitStatus importHomes(const ImportOptions& options, Workspace& workspace) {
   const auto homes = readHomes(options.file);
   if (!homes) return report(homes.failure());
-  const auto registered = openPlatform(settings);
-  if (!registered) return report(registered.failure());
-  if (auto failure = (*registered)->platform()->importHomes(*homes, options.merges)) {
+  const auto session = workspace.home();
+  if (!session) return report(session.failure());
+  if (auto failure = (*session)->platform().importHomes(*homes, options.merges)) {
     return report(*failure);
   }
   return printText("imported " + sizeOf(*homes) + '\n');
@@ -27,7 +27,7 @@ ExitStatus importHomes(const ImportOptions& options, const Settings& settings) {
 
 }  // namespace
 
-void declareHomeImport(CommandSyntax& home, const Settings& settings) {
+void declareHomeImport(CommandSyntax& home, Workspace& workspace) {
   const auto options = std::make_shared<ImportOptions>();
   CommandSyntax& syntax =
       home.command("import", "Puts the homes of a document in place of all homes",
@@ -36,7 +36,7 @@ void declareHomeImport(CommandSyntax& home, const Settings& settings) {
   syntax.requiredArgument("FILE", options->file, "A home document; - reads standard input");
   syntax.flag("--merge", options->merges,
               "Replace only the homes of the same UUID and keep the others");
-  syntax.run([options, &settings] { return importHomes(*options, settings); });
+  syntax.run([options, &workspace] { return importHomes(*options, workspace); });
 }
 
 }  // namespace nidus

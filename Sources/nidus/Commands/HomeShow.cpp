@@ -1,16 +1,16 @@
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/HomeTree.h"
-#include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
 
-ExitStatus showHomes(const Settings& settings) {
-  const auto registered = openPlatform(settings);
-  if (!registered) return report(registered.failure());
-  HomePlatform& platform = *(*registered)->platform();
+ExitStatus showHomes(Workspace& workspace) {
+  const auto session = workspace.home();
+  if (!session) return report(session.failure());
+  HomePlatform& platform = (*session)->platform();
   const auto homes = platform.exportHomes();
   if (!homes) return report(homes.failure());
   if (homes->empty()) return printText("no homes yet; import some with nidus home import FILE\n");
@@ -22,11 +22,11 @@ ExitStatus showHomes(const Settings& settings) {
 
 }  // namespace
 
-void declareHomeShow(CommandSyntax& home, const Settings& settings) {
+void declareHomeShow(CommandSyntax& home, Workspace& workspace) {
   CommandSyntax& syntax =
       home.command("show", "Shows the homes as trees of rooms, accessories, services and values",
                    "Names of types, attributes and values are those that commands use.");
-  syntax.run([&settings] { return showHomes(settings); });
+  syntax.run([&workspace] { return showHomes(workspace); });
 }
 
 }  // namespace nidus

@@ -11,8 +11,8 @@
 #include "nidus/Commands/CommandText.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/Outcome.h"
-#include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
@@ -73,20 +73,20 @@ class Performance {
   std::optional<ExitStatus> status_;
 };
 
-ExitStatus performInput(const Settings& settings) {
-  const auto session = Session::open(settings);
+ExitStatus performInput(Workspace& workspace) {
+  const auto session = workspace.assistant();
   if (!session) return report(session.failure());
   Performance performance(**session);
   performance.performLines(std::cin, kStandardInput);
   return performance.status();
 }
 
-ExitStatus performFile(const std::string& file, const Settings& settings) {
+ExitStatus performFile(const std::string& file, Workspace& workspace) {
   auto in = openInput(file);
   if (!in) return report(in.failure());
   const auto text = readAll(*in, file);
   if (!text) return report(text.failure());
-  const auto session = Session::open(settings);
+  const auto session = workspace.assistant();
   if (!session) return report(session.failure());
   Performance performance(**session);
   if (isOneDocument(*text)) {
@@ -100,7 +100,7 @@ ExitStatus performFile(const std::string& file, const Settings& settings) {
 
 }  // namespace
 
-void declarePerform(CommandSyntax& program, const Settings& settings) {
+void declarePerform(CommandSyntax& program, Workspace& workspace) {
   const auto file = std::make_shared<std::string>("-");
   CommandSyntax& syntax = program.command(
       "perform", "Performs commands and prints the replies",
@@ -114,8 +114,8 @@ void declarePerform(CommandSyntax& program, const Settings& settings) {
       "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform\n"
       "failed; the highest of all commands.");
   syntax.argument("FILE", *file, "The commands; standard input when it is left out or -");
-  syntax.run([file, &settings] {
-    return *file == "-" ? performInput(settings) : performFile(*file, settings);
+  syntax.run([file, &workspace] {
+    return *file == "-" ? performInput(workspace) : performFile(*file, workspace);
   });
 }
 

@@ -1,14 +1,14 @@
 #include "HomePlatform/Json/JsonText.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
-#include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
 
-ExitStatus printRecords(const Settings& settings) {
-  const auto session = Session::open(settings);
+ExitStatus printRecords(Workspace& workspace) {
+  const auto session = workspace.assistant();
   if (!session) return report(session.failure());
   const auto records = (*session)->runner().records();
   if (!records) return report(records.failure());
@@ -22,11 +22,11 @@ ExitStatus printRecords(const Settings& settings) {
 
 }  // namespace
 
-void declareRecords(CommandSyntax& program, const Settings& settings) {
+void declareRecords(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& syntax =
       program.command("records", "Prints the objects that a filter is resolved against",
                       "JSON lines, one record a line, in the order of the home.");
-  syntax.run([&settings] { return printRecords(settings); });
+  syntax.run([&workspace] { return printRecords(workspace); });
 }
 
 }  // namespace nidus

@@ -2,8 +2,8 @@
 #include "AssistantHost/SyncClient.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
-#include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
@@ -21,8 +21,8 @@ std::string changeLine(const SyncChange& change) {
   return jsonLine(line);
 }
 
-ExitStatus synchronise(const Settings& settings) {
-  const auto session = Session::open(settings);
+ExitStatus synchronise(Workspace& workspace) {
+  const auto session = workspace.assistant();
   if (!session) return report(session.failure());
   const auto made = SyncClient::make((*session)->module());
   if (!made) return report(made.failure());
@@ -43,11 +43,11 @@ ExitStatus synchronise(const Settings& settings) {
 
 }  // namespace
 
-void declareSync(CommandSyntax& program, const Settings& settings) {
+void declareSync(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& syntax = program.command(
       "sync", "Prints the names that the assistant learns",
       "JSON lines: first the reset with its validity, then one entity a line with its anchor.");
-  syntax.run([&settings] { return synchronise(settings); });
+  syntax.run([&workspace] { return synchronise(workspace); });
 }
 
 }  // namespace nidus

@@ -1,0 +1,35 @@
+#pragma once
+
+#include <memory>
+
+#include "HomePlatform/Result.h"
+#include "nidus/Session.h"
+#include "nidus/Settings.h"
+
+namespace nidus {
+
+/// What the commands of one process share: what was asked for on the command line, and the session,
+/// which is opened when a command first needs it and then kept.
+///
+/// Used by the main thread alone.
+///
+///     const auto session = workspace.assistant();
+///     if (!session) return report(session.failure());
+///     (*session)->runner().perform(**command);
+class Workspace {
+ public:
+  /// What was asked for; read when a command runs.
+  [[nodiscard]] Settings& settings() noexcept { return settings_; }
+
+  /// The session with its platform; never null, valid as long as this. The device is locked or not
+  /// as the settings say now.
+  [[nodiscard]] Result<Session*> home();
+  /// The same with the plug-in's module open.
+  [[nodiscard]] Result<Session*> assistant();
+
+ private:
+  Settings settings_;
+  std::unique_ptr<Session> session_;
+};
+
+}  // namespace nidus
