@@ -77,6 +77,7 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   declarePerform(program, workspace);
   declareSync(program, workspace);
   declareRecords(program, workspace);
+  declareVocabulary(program, workspace);
   declareReplay(program);
   declareDemo(program);
 }

@@ -24,6 +24,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"perform"}, {"FILE", "standard input", "Exit status", "\"filter\""}},
       {{"sync"}, {"reset"}},
       {{"records"}, {"record a line"}},
+      {{"vocabulary"}, {"WORD", "--json", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
       {{"demo"}, {"temporary folder"}},
   };

@@ -7,6 +7,9 @@
 
 namespace nidus {
 
+/// The "format" of a vocabulary document.
+inline constexpr const char kVocabularyFormat[] = "nidus-vocabulary/1";
+
 /// The tables between the assistant's words and the platform's types, as plain data. Texts are
 /// never null unless said so.
 
@@ -42,6 +45,10 @@ struct Vocabulary {
   std::vector<ServiceEntry> services;
   std::vector<CharacteristicEntry> characteristics;
   std::vector<UnitEntry> units;
+
+  [[nodiscard]] bool isEmpty() const noexcept {
+    return services.empty() && characteristics.empty() && units.empty();
+  }
 };
 
 }  // namespace nidus

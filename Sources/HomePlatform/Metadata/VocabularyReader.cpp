@@ -17,7 +17,6 @@ extern const std::string_view kBuiltInVocabulary;
 
 namespace {
 
-constexpr const char* kFormat = "nidus-vocabulary/1";
 constexpr std::size_t kGreatestSize = std::size_t{16} << 20;
 
 NDString optionalText(JsonObject& object, std::string_view key) {
@@ -150,7 +149,9 @@ Vocabulary merge(Vocabulary vocabulary, std::string_view text) {
   const JsonValue value = parseJson(text);
   JsonObject document(JsonPlaced(value, ""));
   const JsonPlaced format = document.required("format");
-  if (format.text() != kFormat) format.fail(std::string("expected \"") + kFormat + '"');
+  if (format.text() != kVocabularyFormat) {
+    format.fail(std::string("expected \"") + kVocabularyFormat + '"');
+  }
   mergeList(document, "services", vocabulary.services);
   mergeList(document, "characteristics", vocabulary.characteristics);
   mergeList(document, "units", vocabulary.units);

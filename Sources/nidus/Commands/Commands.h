@@ -15,6 +15,7 @@ void declareHomeCheck(CommandSyntax& home);
 void declarePerform(CommandSyntax& program, Workspace& workspace);
 void declareSync(CommandSyntax& program, Workspace& workspace);
 void declareRecords(CommandSyntax& program, Workspace& workspace);
+void declareVocabulary(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
 

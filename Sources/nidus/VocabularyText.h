@@ -1,0 +1,21 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "HomePlatform/Metadata/Vocabulary.h"
+
+namespace nidus {
+
+/// The entries whose assistant name is `word` or, when there is none, those whose assistant name or
+/// one of whose values contains it; the case of ASCII letters does not matter.
+[[nodiscard]] Vocabulary entriesMatching(const Vocabulary& vocabulary, std::string_view word);
+
+/// All words of a vocabulary for people who write orders: the attributes with their values, and the
+/// types and units.
+[[nodiscard]] std::string vocabularyText(const Vocabulary& vocabulary);
+
+/// Everything about each entry of a vocabulary, several lines each, the platform's types included.
+[[nodiscard]] std::string vocabularyDetails(const Vocabulary& vocabulary);
+
+}  // namespace nidus
