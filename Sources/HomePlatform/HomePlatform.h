@@ -14,6 +14,7 @@
 #include "HomePlatform/PlatformCall.h"
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
+#include "HomePlatform/Store/HomeEdit.h"
 #include "PlatformModel/NDPlatform.h"
 
 namespace nidus {
@@ -62,6 +63,11 @@ class HomePlatform : public NDPlatform {
   /// Puts `homes` into the database: in place of all (or, with `merge`, of those of the same UUID)
   /// in one transaction; afterwards sets "kHomesConfigured" to whether there are homes.
   [[nodiscard]] virtual Status importHomes(const std::vector<HomeData>& homes, bool merge) = 0;
+  /// Lets `edit` change the homes as the database has them, in one transaction: no value that
+  /// anybody writes meanwhile is lost. Checks and keeps what it leaves, and sets "kHomesConfigured"
+  /// as an import does; after a failure all is as it was. `edit` must be quick and must not call
+  /// the platform.
+  [[nodiscard]] virtual Status editHomes(const HomeEdit& edit) = 0;
   /// The homes as the database has them now.
   [[nodiscard]] virtual Result<std::vector<HomeData>> exportHomes() = 0;
 

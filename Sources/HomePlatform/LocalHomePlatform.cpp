@@ -100,17 +100,24 @@ std::shared_ptr<NDNotificationCenter> LocalHomePlatform::notificationCenter() {
 }
 
 Status LocalHomePlatform::importHomes(const std::vector<HomeData>& homes, bool merge) {
-  if (!options_.dataFolder) return replaceHomes(homes, merge);
-  // Two imports at the same time would otherwise leave a preference that suits neither.
-  const Result<FolderLock> lock = FolderLock::take(*options_.dataFolder);
-  return lock ? replaceHomes(homes, merge) : Status(lock.failure());
+  return changeHomes(
+      [&] { return merge ? store_->mergeHomes(homes) : store_->replaceHomes(homes); });
 }
 
-Status LocalHomePlatform::replaceHomes(const std::vector<HomeData>& homes, bool merge) {
+Status LocalHomePlatform::editHomes(const HomeEdit& edit) {
+  return changeHomes([&] { return store_->editHomes(edit); });
+}
+
+Status LocalHomePlatform::changeHomes(const std::function<Status()>& change) {
+  if (!options_.dataFolder) return changeHomesUnlocked(change);
+  // Two changes at the same time would otherwise leave a preference that suits neither.
+  const Result<FolderLock> lock = FolderLock::take(*options_.dataFolder);
+  return lock ? changeHomesUnlocked(change) : Status(lock.failure());
+}
+
+Status LocalHomePlatform::changeHomesUnlocked(const std::function<Status()>& change) {
   if (Status failure = preferences_->check()) return failure;
-  if (Status failure = merge ? store_->mergeHomes(homes) : store_->replaceHomes(homes)) {
-    return failure;
-  }
+  if (Status failure = change()) return failure;
   const Result<std::int64_t> count = store_->countHomes();
   if (!count) return count.failure();
   return preferences_->change({{kHomesConfigured, JsonValue{*count > 0}}});

@@ -49,6 +49,7 @@ class LocalHomePlatform final : public HomePlatform {
   [[nodiscard]] std::shared_ptr<NDClock> clock() override { return queues_->clock(); }
 
   [[nodiscard]] Status importHomes(const std::vector<HomeData>& homes, bool merge) override;
+  [[nodiscard]] Status editHomes(const HomeEdit& edit) override;
   [[nodiscard]] Result<std::vector<HomeData>> exportHomes() override;
   [[nodiscard]] const Vocabulary& vocabulary() const noexcept override {
     return mapper_->vocabulary();
@@ -60,7 +61,9 @@ class LocalHomePlatform final : public HomePlatform {
   void shutDown() override;
 
  private:
-  [[nodiscard]] Status replaceHomes(const std::vector<HomeData>& homes, bool merge);
+  /// Makes a change of the stored homes and sets the preference that goes with it.
+  [[nodiscard]] Status changeHomes(const std::function<Status()>& change);
+  [[nodiscard]] Status changeHomesUnlocked(const std::function<Status()>& change);
   void watchPreferences();
 
   const HomePlatformOptions options_;

@@ -261,6 +261,47 @@ TEST(HomePlatformTest, ImportSaysWhetherHomesAreConfigured) {
   }
 }
 
+TEST(HomePlatformTest, EditSaysWhetherHomesAreConfigured) {
+  const TestFolder folder;
+  for (const auto& options : {onCaller(), inFolder(folder)}) {
+    const OpenPlatform platform(options);
+    ASSERT_FALSE(platform->editHomes([](std::vector<HomeData>& homes) {
+      homes.push_back(sampleHome());
+      return Status();
+    }));
+    EXPECT_TRUE(isConfigured(*platform));
+    ASSERT_FALSE(platform->editHomes([](std::vector<HomeData>& homes) {
+      homes.clear();
+      return Status();
+    }));
+    EXPECT_FALSE(isConfigured(*platform));
+  }
+}
+
+TEST(HomePlatformTest, EditedHomesComeAsNewList) {
+  const OpenPlatform platform(onCaller());
+  ASSERT_FALSE(platform->importHomes({sampleHome()}, false));
+  const auto before = platform.homes();
+  ASSERT_FALSE(platform->editHomes([](std::vector<HomeData>& homes) {
+    homes.at(0).name = "Loft";
+    return Status();
+  }));
+  EXPECT_EQ(platform.homes()[0]->name(), "Loft");
+  EXPECT_NE(before[0]->name(), "Loft");
+}
+
+TEST(HomePlatformTest, FailedEditChangesNothing) {
+  const OpenPlatform platform(onCaller());
+  ASSERT_FALSE(platform->importHomes({sampleHome()}, false));
+  const Status failure = platform->editHomes([](std::vector<HomeData>& homes) {
+    homes.clear();
+    return Status({Failure::Kind::badInput, "no"});
+  });
+  ASSERT_TRUE(failure);
+  EXPECT_EQ(platform->exportHomes()->size(), 1U);
+  EXPECT_TRUE(isConfigured(*platform));
+}
+
 TEST(HomePlatformTest, DamagedPreferencesKeepHomesAsTheyAre) {
   const TestFolder folder;
   const OpenPlatform platform(inFolder(folder));

@@ -191,4 +191,16 @@ void checkHomesAreUnique(const std::vector<HomeData>& homes, const std::string& 
   }
 }
 
+Status checkHomes(const std::vector<HomeData>& homes, const std::string& name) {
+  try {
+    for (std::size_t i = 0; i < homes.size(); ++i) {
+      checkHome(homes[i], Element{"", "homes", i}.place());
+    }
+    checkHomesAreUnique(homes, "");
+  } catch (const JsonError& error) {
+    return failureOf(error, name);
+  }
+  return std::nullopt;
+}
+
 }  // namespace nidus

@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
 
 namespace nidus {
@@ -14,5 +15,9 @@ void checkHome(const HomeData& home, const std::string& place);
 
 /// Checks that no two homes have the same UUID. `place` is the document's JSON pointer.
 void checkHomesAreUnique(const std::vector<HomeData>& homes, const std::string& place);
+
+/// Checks both for all of `homes`. The failure is bad input, calls the homes `name` and has the
+/// place of the first part that breaks it.
+[[nodiscard]] Status checkHomes(const std::vector<HomeData>& homes, const std::string& name);
 
 }  // namespace nidus

@@ -4,6 +4,7 @@
 
 #include "HomePlatform/Store/Database.h"
 #include "HomePlatform/Store/DatabaseFile.h"
+#include "HomePlatform/Store/HomeChecks.h"
 #include "HomePlatform/Store/HomeInserter.h"
 #include "HomePlatform/Store/HomeLoader.h"
 #include "HomePlatform/Store/Schema.h"
@@ -66,10 +67,8 @@ class SqliteHomeStore final : public HomeStore {
 
   Status replaceHomes(const std::vector<HomeData>& homes) override {
     return change([&homes](Database& database) {
-      database.run("DELETE FROM home");
-      HomeInserter inserter(database);
-      std::int64_t position = 0;
-      for (const HomeData& home : homes) inserter.insert(home, position++);
+      putInPlaceOfAll(database, homes);
+      return Status();
     });
   }
 
@@ -86,6 +85,17 @@ class SqliteHomeStore final : public HomeStore {
         remove.run(home.uuid);
         inserter.insert(home, position);
       }
+      return Status();
+    });
+  }
+
+  Status editHomes(const HomeEdit& edit) override {
+    return change([&edit](Database& database) {
+      std::vector<HomeData> homes = loadHomesFrom(database);
+      Status failed = edit(homes);
+      if (!failed) failed = checkHomes(homes, "the changed homes");
+      if (!failed) putInPlaceOfAll(database, homes);
+      return failed;
     });
   }
 
@@ -142,6 +152,13 @@ class SqliteHomeStore final : public HomeStore {
       "JOIN characteristic ON characteristic.service = service.id "
       "AND characteristic.instance_id = ?4 WHERE home.uuid = ?1)";
 
+  static void putInPlaceOfAll(Database& database, const std::vector<HomeData>& homes) {
+    database.run("DELETE FROM home");
+    HomeInserter inserter(database);
+    std::int64_t position = 0;
+    for (const HomeData& home : homes) inserter.insert(home, position++);
+  }
+
   static std::int64_t positionAtEnd(Database& database) {
     return database.number("SELECT ifnull(max(position) + 1, 0) FROM home");
   }
@@ -152,7 +169,7 @@ class SqliteHomeStore final : public HomeStore {
     NDLock lock(mutex_);
     try {
       Transaction transaction(database_, Transaction::Kind::writing);
-      change(database_);
+      if (Status failed = change(database_)) return failed;
       transaction.commit();
     } catch (const DatabaseError& error) {
       return failureOf(error, name_);

@@ -10,6 +10,7 @@
 
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
+#include "HomePlatform/Store/HomeEdit.h"
 
 namespace nidus {
 
@@ -43,13 +44,19 @@ class HomeStore {
   [[nodiscard]] virtual Status replaceHomes(const std::vector<HomeData>& homes) = 0;
   /// Replaces the homes of the same UUID in their places and adds the others at the end.
   [[nodiscard]] virtual Status mergeHomes(const std::vector<HomeData>& homes) = 0;
+  /// Lets `edit`, which is not empty, change the homes as they are, and stores what it leaves if it
+  /// is what a home document may hold. Nobody else writes meanwhile: `edit` must be quick and must
+  /// not call the store. The failure is that of `edit`, or bad input with the place of what is
+  /// wrong in the changed homes; it leaves everything as it was.
+  [[nodiscard]] virtual Status editHomes(const HomeEdit& edit) = 0;
   /// Reads all homes in order, within one transaction.
   [[nodiscard]] virtual Result<std::vector<HomeData>> loadHomes() = 0;
   [[nodiscard]] virtual Result<std::int64_t> countHomes() = 0;
   /// Writes all of `changes`, or none; an address that is no longer there is passed over.
   [[nodiscard]] virtual Status writeValues(const std::vector<ValueChange>& changes) = 0;
   /// A number that differs after each change of the database by another connection or process, and
-  /// after each `replaceHomes` and `mergeHomes` of this one; `writeValues` of this one keeps it.
+  /// after each `replaceHomes`, `mergeHomes` and `editHomes` of this one; `writeValues` of this one
+  /// keeps it.
   [[nodiscard]] virtual Result<std::uint64_t> version() = 0;
 };
 

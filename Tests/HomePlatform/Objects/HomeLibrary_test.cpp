@@ -23,6 +23,7 @@ class ScriptedStore final : public HomeStore {
  public:
   Status replaceHomes(const std::vector<HomeData>&) override { return std::nullopt; }
   Status mergeHomes(const std::vector<HomeData>&) override { return std::nullopt; }
+  Status editHomes(const HomeEdit&) override { return std::nullopt; }
   Result<std::vector<HomeData>> loadHomes() override {
     ++loads;
     if (isBroken) return kBroken;

@@ -159,6 +159,92 @@ TEST_F(HomeStoreTest, KeepsOldHomesWhenAMergeFails) {
   EXPECT_EQ(contents(*store), documentOf({lampHome()}));
 }
 
+/// Renames the first of the homes.
+HomeEdit renaming(const char* name) {
+  return [name](std::vector<HomeData>& homes) {
+    homes.at(0).name = name;
+    return Status();
+  };
+}
+
+TEST_F(HomeStoreTest, EditsHomesAsTheyAre) {
+  auto store = open();
+  auto other = open();
+  ASSERT_FALSE(store->replaceHomes({lampHome()}));
+  ASSERT_FALSE(other->writeValues({change(9, NDValue::integer(77))}));
+  ASSERT_FALSE(store->editHomes(renaming("Loft")));
+  EXPECT_EQ(store->loadHomes()->at(0).name, "Loft");
+  EXPECT_EQ(lamp(*store).value->integerValue(), 77);
+}
+
+TEST_F(HomeStoreTest, EditingKeepsRandomHomes) {
+  auto store = open();
+  for (unsigned seed = 0; seed < 30; ++seed) {
+    const std::vector<HomeData> homes = RandomHome(seed).homes();
+    ASSERT_FALSE(store->replaceHomes(homes));
+    ASSERT_FALSE(store->editHomes([](std::vector<HomeData>&) { return Status(); }));
+    ASSERT_EQ(contents(*store), documentOf(homes)) << seed;
+  }
+}
+
+TEST_F(HomeStoreTest, NobodyWritesDuringAnEdit) {
+  auto store = open();
+  ASSERT_FALSE(store->replaceHomes({lampHome()}));
+  auto other = std::move(*HomeStore::open(file(), std::chrono::milliseconds(0)));
+  Status refusal;
+  ASSERT_FALSE(store->editHomes([&](std::vector<HomeData>&) {
+    refusal = other->writeValues({change(9, NDValue::integer(77))});
+    return Status();
+  }));
+  ASSERT_TRUE(refusal);
+  EXPECT_THAT(refusal->message, HasSubstr("locked"));
+}
+
+TEST_F(HomeStoreTest, KeepsOldHomesWhenAnEditFails) {
+  auto store = open();
+  ASSERT_FALSE(store->replaceHomes({lampHome()}));
+  const Status failure = store->editHomes([](std::vector<HomeData>& homes) {
+    homes.clear();
+    return Status({Failure::Kind::badInput, "no"});
+  });
+  ASSERT_TRUE(failure);
+  EXPECT_EQ(failure->message, "no");
+  EXPECT_EQ(contents(*store), documentOf({lampHome()}));
+}
+
+struct WrongEdit {
+  const char* label;
+  HomeEdit edit;
+  const char* message;
+};
+
+TEST_F(HomeStoreTest, RefusesEditsThatNoDocumentMayHold) {
+  const WrongEdit table[] = {
+      {"two homes of one UUID",
+       [](std::vector<HomeData>& homes) {
+         homes.push_back(homes.front());
+         return Status();
+       },
+       "the changed homes: /homes/1/uuid: "},
+      {"a room that is not there",
+       [](std::vector<HomeData>& homes) {
+         homes.at(0).accessories.at(0).room = testUUID(7);
+         return Status();
+       },
+       "the changed homes: /homes/0/accessories/0/room: "},
+  };
+  auto store = open();
+  ASSERT_FALSE(store->replaceHomes({lampHome()}));
+  for (const WrongEdit& wrong : table) {
+    SCOPED_TRACE(wrong.label);
+    const Status failure = store->editHomes(wrong.edit);
+    ASSERT_TRUE(failure);
+    EXPECT_EQ(failure->kind, Failure::Kind::badInput);
+    EXPECT_THAT(failure->message, HasSubstr(wrong.message));
+    EXPECT_EQ(contents(*store), documentOf({lampHome()}));
+  }
+}
+
 TEST_F(HomeStoreTest, WritesOneValueAtATime) {
   auto store = open();
   ASSERT_FALSE(store->replaceHomes({lampHome()}));
