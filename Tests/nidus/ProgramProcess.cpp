@@ -2,56 +2,18 @@
 
 #include <fcntl.h>
 #include <poll.h>
-#include <spawn.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include <array>
 #include <csignal>
 #include <stdexcept>
 
+#include "nidus/ProgramSpawn.h"
+
 namespace nidus {
 namespace {
 
 constexpr int kPatienceMs = 60000;
-
-std::vector<char*> pointersTo(std::vector<std::string>& texts) {
-  std::vector<char*> pointers;
-  for (std::string& text : texts) pointers.push_back(text.data());
-  pointers.push_back(nullptr);
-  return pointers;
-}
-
-std::vector<std::string> environmentOf(const ProgramStart& start) {
-  std::vector<std::string> environment;
-  for (char** entry = environ; *entry; ++entry) {
-    const std::string_view text = *entry;
-    if (!start.environment.contains(std::string(text.substr(0, text.find('='))))) {
-      environment.emplace_back(text);
-    }
-  }
-  for (const auto& [name, value] : start.environment) {
-    if (value) environment.push_back(name + '=' + *value);
-  }
-  return environment;
-}
-
-/// Starts the program with these files as its standard ones.
-pid_t spawn(const ProgramStart& start, const std::array<int, 3>& files) {
-  std::vector<std::string> arguments = {start.program};
-  arguments.insert(arguments.end(), start.arguments.begin(), start.arguments.end());
-  std::vector<std::string> environment = environmentOf(start);
-  posix_spawn_file_actions_t actions;
-  posix_spawn_file_actions_init(&actions);
-  int target = 0;
-  for (const int file : files) posix_spawn_file_actions_adddup2(&actions, file, target++);
-  pid_t process = -1;
-  const int error = posix_spawn(&process, start.program.c_str(), &actions, nullptr,
-                                pointersTo(arguments).data(), pointersTo(environment).data());
-  posix_spawn_file_actions_destroy(&actions);
-  if (error != 0) throw std::runtime_error("can not start " + start.program);
-  return process;
-}
 
 int openFile(const std::string& file, int flags) {
   const int number = open(file.c_str(), flags | O_CLOEXEC, 0600);
@@ -60,15 +22,6 @@ int openFile(const std::string& file, int flags) {
 }
 
 int openOutput(const std::string& file) { return openFile(file, O_WRONLY | O_CREAT | O_APPEND); }
-
-ProgramEnd waitFor(pid_t process) {
-  int status = 0;
-  waitpid(process, &status, 0);
-  ProgramEnd end;
-  if (WIFEXITED(status)) end.exitStatus = WEXITSTATUS(status);
-  if (WIFSIGNALED(status)) end.signal = WTERMSIG(status);
-  return end;
-}
 
 }  // namespace
 
@@ -81,7 +34,7 @@ ProgramProcess::ProgramProcess(const ProgramStart& start) {
     throw std::runtime_error("no pipes");
   }
   const int errors = openOutput(folder_.file("errors"));
-  process_ = spawn(start, {input[0], output[1], errors});
+  process_ = spawnProgram(start, {input[0], output[1], errors});
   close(input[0]);
   close(output[1]);
   close(errors);
@@ -117,7 +70,7 @@ ProgramEnd ProgramProcess::finish() {
   std::string output;
   for (auto line = readLine(); line; line = readLine()) output += *line + '\n';
   close(output_);
-  ProgramEnd end = waitFor(process_);
+  ProgramEnd end = waitForEnd(process_);
   process_ = -1;
   end.output = output;
   end.errors = contentOfFile(folder_.file("errors"));
@@ -130,9 +83,9 @@ ProgramEnd runProgram(const ProgramStart& start) {
   const int in = openFile(folder.write("input", start.input), O_RDONLY);
   const int out = openOutput(output);
   const int errors = openOutput(folder.file("errors"));
-  const pid_t process = spawn(start, {in, out, errors});
+  const pid_t process = spawnProgram(start, {in, out, errors});
   for (const int file : {in, out, errors}) close(file);
-  ProgramEnd end = waitFor(process);
+  ProgramEnd end = waitForEnd(process);
   if (start.outputFile.empty()) end.output = contentOfFile(output);
   end.errors = contentOfFile(folder.file("errors"));
   return end;
