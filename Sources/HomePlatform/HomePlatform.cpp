@@ -1,6 +1,7 @@
 #include "HomePlatform/HomePlatform.h"
 
 #include <iostream>
+#include <system_error>
 #include <utility>
 
 #include "HomePlatform/LocalHomePlatform.h"
@@ -52,6 +53,11 @@ Result<std::shared_ptr<HomePlatform>> HomePlatform::open(HomePlatformOptions opt
                                  std::move(*store)};
   return std::shared_ptr<HomePlatform>(
       std::make_shared<LocalHomePlatform>(std::move(options), std::move(parts)));
+}
+
+bool HomePlatform::hasDatabase(const std::filesystem::path& folder) {
+  std::error_code ignored;
+  return std::filesystem::exists(folder / kDatabaseName, ignored);
 }
 
 }  // namespace nidus

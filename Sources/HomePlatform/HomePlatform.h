@@ -59,6 +59,8 @@ struct HomePlatformOptions {
 class HomePlatform : public NDPlatform {
  public:
   [[nodiscard]] static Result<std::shared_ptr<HomePlatform>> open(HomePlatformOptions options);
+  /// Whether opening `folder` would find a home database there; looks without making anything.
+  [[nodiscard]] static bool hasDatabase(const std::filesystem::path& folder);
 
   /// Puts `homes` into the database: in place of all (or, with `merge`, of those of the same UUID)
   /// in one transaction; afterwards sets "kHomesConfigured" to whether there are homes.

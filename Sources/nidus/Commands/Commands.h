@@ -18,5 +18,7 @@ void declareRecords(CommandSyntax& program, Workspace& workspace);
 void declareVocabulary(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
+void declareComplete(CommandSyntax& program, Workspace& workspace);
+void declareCompletion(CommandSyntax& program);
 
 }  // namespace nidus
