@@ -26,6 +26,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"records"}, {"record a line"}},
       {{"vocabulary"}, {"WORD", "--json", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
+      {{"completion"}, {"bash, zsh or fish", "Exit status"}},
       {{"demo"}, {"temporary folder"}},
   };
   for (const HelpCase& help : table) {

@@ -33,7 +33,8 @@ void declareCompletion(CommandSyntax& program) {
       "completion", "Prints the script by which a shell completes commands of nidus",
       "It completes commands, options, attributes, and the names of your own home. "
       "Its first\nlines say where it goes. To try it in this session of bash:\n"
-      "  source <(nidus completion bash)");
+      "  source <(nidus completion bash)\n\n"
+      "Exit status: 0 success, 2 for another shell.");
   syntax.requiredArgument("SHELL", *shell, "bash, zsh or fish");
   syntax.candidates("SHELL", {Candidates(std::vector<std::string>{"bash", "zsh", "fish"})});
   syntax.run([shell] { return printScript(*shell); });

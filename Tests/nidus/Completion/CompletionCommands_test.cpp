@@ -22,6 +22,20 @@ TEST_F(CompleteCommandTest, MarksFilesByAnEmptyLine) {
   EXPECT_EQ(run({"complete", "--", "--data", ""}).output, "\n");
 }
 
+TEST_F(CompleteCommandTest, KnowsTheWordsWithoutADataFolder) {
+  EXPECT_EQ(run({"complete", "--", "vocabulary", "brigh"}).output, "brightness\n");
+  EXPECT_FALSE(std::filesystem::exists(data()));
+}
+
+TEST_F(CompleteCommandTest, TellsOfAHomeThatCannotBeRead) {
+  std::filesystem::create_directories(data());
+  folder_.write("data/home.db", "no database at all, but something else of some length");
+  const ProgramEnd end = run({"complete", "--", "vocabulary", ""});
+  EXPECT_EQ(end.exitStatus, 4);
+  EXPECT_THAT(end.output, IsEmpty());
+  EXPECT_THAT(end.errors, IsOneFailure(data()));
+}
+
 TEST_F(CompleteCommandTest, IsForProgramsAlone) {
   EXPECT_THAT(run({"--help"}).output, ::testing::Not(HasSubstr("complete ")));
   EXPECT_THAT(run({"complete", "--", "complet"}).output, "completion\n");
