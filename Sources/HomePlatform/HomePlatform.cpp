@@ -30,6 +30,21 @@ void fillIn(HomePlatformOptions& options) {
   }
 }
 
+Result<Vocabulary> openVocabulary(HomePlatformOptions& options) {
+  if (!options.dataFolder && options.vocabulary) return std::move(*options.vocabulary);
+  return loadVocabulary(fileOf(options, kVocabularyName));
+}
+
+Result<std::shared_ptr<HomeStore>> openStore(HomePlatformOptions& options) {
+  auto store = HomeStore::open(fileOf(options, kDatabaseName));
+  if (!store) return store.failure();
+  const auto homes = std::exchange(options.homes, {});
+  if (!options.dataFolder && !homes.empty()) {
+    if (Status failure = (*store)->replaceHomes(homes)) return *failure;
+  }
+  return std::shared_ptr<HomeStore>(std::move(*store));
+}
+
 Result<std::shared_ptr<Preferences>> openPreferences(const HomePlatformOptions& options) {
   if (options.dataFolder) return Preferences::open(*options.dataFolder, options.failureHandler);
   return Preferences::inMemory(options.preferences, kMemoryContainer);
@@ -42,11 +57,11 @@ Result<std::shared_ptr<HomePlatform>> HomePlatform::open(HomePlatformOptions opt
   if (options.dataFolder) {
     if (Status failure = prepareDataFolder(*options.dataFolder)) return *failure;
   }
-  auto vocabulary = loadVocabulary(fileOf(options, kVocabularyName));
+  auto vocabulary = openVocabulary(options);
   if (!vocabulary) return vocabulary.failure();
   auto preferences = openPreferences(options);
   if (!preferences) return preferences.failure();
-  auto store = HomeStore::open(fileOf(options, kDatabaseName));
+  auto store = openStore(options);
   if (!store) return store.failure();
   LocalHomePlatform::Parts parts{std::move(*preferences),
                                  std::make_shared<MetadataMapper>(std::move(*vocabulary)),
