@@ -1,7 +1,6 @@
 #include "HomePlatform/HomePlatform.h"
 
 #include <iostream>
-#include <system_error>
 #include <utility>
 
 #include "HomePlatform/LocalHomePlatform.h"
@@ -11,8 +10,6 @@
 namespace nidus {
 namespace {
 
-constexpr const char* kDatabaseName = "home.db";
-constexpr const char* kVocabularyName = "vocabulary.json";
 constexpr const char* kMemoryContainer = "memory";
 
 /// The file of that name in the data folder; none for a platform in memory.
@@ -30,21 +27,6 @@ void fillIn(HomePlatformOptions& options) {
   }
 }
 
-Result<Vocabulary> openVocabulary(HomePlatformOptions& options) {
-  if (!options.dataFolder && options.vocabulary) return std::move(*options.vocabulary);
-  return loadVocabulary(fileOf(options, kVocabularyName));
-}
-
-Result<std::shared_ptr<HomeStore>> openStore(HomePlatformOptions& options) {
-  auto store = HomeStore::open(fileOf(options, kDatabaseName));
-  if (!store) return store.failure();
-  const auto homes = std::exchange(options.homes, {});
-  if (!options.dataFolder && !homes.empty()) {
-    if (Status failure = (*store)->replaceHomes(homes)) return *failure;
-  }
-  return std::shared_ptr<HomeStore>(std::move(*store));
-}
-
 Result<std::shared_ptr<Preferences>> openPreferences(const HomePlatformOptions& options) {
   if (options.dataFolder) return Preferences::open(*options.dataFolder, options.failureHandler);
   return Preferences::inMemory(options.preferences, kMemoryContainer);
@@ -57,22 +39,17 @@ Result<std::shared_ptr<HomePlatform>> HomePlatform::open(HomePlatformOptions opt
   if (options.dataFolder) {
     if (Status failure = prepareDataFolder(*options.dataFolder)) return *failure;
   }
-  auto vocabulary = openVocabulary(options);
+  auto vocabulary = loadVocabulary(fileOf(options, kVocabularyFile));
   if (!vocabulary) return vocabulary.failure();
   auto preferences = openPreferences(options);
   if (!preferences) return preferences.failure();
-  auto store = openStore(options);
+  auto store = HomeStore::open(fileOf(options, kDatabaseFile));
   if (!store) return store.failure();
   LocalHomePlatform::Parts parts{std::move(*preferences),
                                  std::make_shared<MetadataMapper>(std::move(*vocabulary)),
                                  std::move(*store)};
   return std::shared_ptr<HomePlatform>(
       std::make_shared<LocalHomePlatform>(std::move(options), std::move(parts)));
-}
-
-bool HomePlatform::hasDatabase(const std::filesystem::path& folder) {
-  std::error_code ignored;
-  return std::filesystem::exists(folder / kDatabaseName, ignored);
 }
 
 }  // namespace nidus

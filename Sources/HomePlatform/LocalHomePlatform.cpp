@@ -10,7 +10,6 @@
 namespace nidus {
 namespace {
 
-constexpr const char* kHomesConfigured = "kHomesConfigured";
 constexpr const char* kPreferencesChanged = "com.corvane.managedconfiguration.defaultsdidchange";
 
 std::unique_ptr<PlatformQueues> makeQueues(const HomePlatformOptions& options) {
@@ -120,7 +119,7 @@ Status LocalHomePlatform::changeHomesUnlocked(const std::function<Status()>& cha
   if (Status failure = change()) return failure;
   const Result<std::int64_t> count = store_->countHomes();
   if (!count) return count.failure();
-  return preferences_->change({{kHomesConfigured, JsonValue{*count > 0}}});
+  return preferences_->change({{Preferences::kHomesConfigured, JsonValue{*count > 0}}});
 }
 
 Result<std::vector<HomeData>> LocalHomePlatform::exportHomes() { return store_->loadHomes(); }

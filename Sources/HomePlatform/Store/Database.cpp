@@ -34,8 +34,10 @@ DatabaseError::Kind kindOf(int code) {
 
 }  // namespace
 
-Database::Database(const std::string& path, std::chrono::milliseconds lockTimeout) {
-  const int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_CREATE | SQLITE_OPEN_NOMUTEX;
+Database::Database(const std::string& path, std::chrono::milliseconds lockTimeout,
+                   MissingFile missingFile) {
+  const int making = missingFile == MissingFile::isMade ? SQLITE_OPEN_CREATE : 0;
+  const int flags = SQLITE_OPEN_READWRITE | SQLITE_OPEN_NOMUTEX | making;
   try {
     check(sqlite3_open_v2(path.c_str(), &connection_, flags, nullptr));
     configure(lockTimeout);

@@ -40,9 +40,13 @@ class Database {
  public:
   static constexpr const char* kInMemory = ":memory:";
 
-  /// Opens the file `path`, which is made when it is missing, or with `kInMemory` a database of
-  /// this object alone. Waits up to `lockTimeout` where another connection holds a lock.
-  Database(const std::string& path, std::chrono::milliseconds lockTimeout);
+  /// Whether a file that is missing is made or an error.
+  enum class MissingFile { isMade, isAnError };
+
+  /// Opens the file `path`, or with `kInMemory` a database of this object alone. Waits up to
+  /// `lockTimeout` where another connection holds a lock.
+  Database(const std::string& path, std::chrono::milliseconds lockTimeout,
+           MissingFile missingFile = MissingFile::isMade);
   ~Database();
   Database(const Database&) = delete;
   Database& operator=(const Database&) = delete;

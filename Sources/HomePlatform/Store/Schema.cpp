@@ -155,24 +155,36 @@ const std::vector<std::string>& schemaSteps() {
   return kSteps;
 }
 
-std::optional<SchemaProblem> applySchema(Database& database,
-                                         const std::vector<std::string>& steps) {
-  const auto newest = static_cast<std::int64_t>(steps.size());
-  const std::int64_t application = database.number("PRAGMA application_id");
-  if (application == kSchemaApplicationID && database.number("PRAGMA user_version") == newest) {
-    return std::nullopt;  // nearly always, and without a lock
-  }
-  Transaction transaction(database, Transaction::Kind::writing);
+bool isSchemaCurrent(Database& database, const std::vector<std::string>& steps) {
+  return database.number("PRAGMA application_id") == kSchemaApplicationID &&
+         database.number("PRAGMA user_version") == static_cast<std::int64_t>(steps.size());
+}
+
+std::optional<SchemaProblem> schemaProblemOf(Database& database,
+                                             const std::vector<std::string>& steps) {
   if (database.number("PRAGMA application_id") != kSchemaApplicationID && !isEmpty(database)) {
     return SchemaProblem::notOurs;
   }
   const std::int64_t version = database.number("PRAGMA user_version");
-  if (version < 0 || version > newest) return SchemaProblem::newer;
+  if (version < 0 || version > static_cast<std::int64_t>(steps.size())) return SchemaProblem::newer;
+  return std::nullopt;
+}
+
+void runSchemaSteps(Database& database, const std::vector<std::string>& steps) {
+  const std::int64_t version = database.number("PRAGMA user_version");
   for (auto step = static_cast<std::size_t>(version); step < steps.size(); ++step) {
     database.run(steps[step]);
   }
   database.run("PRAGMA application_id = " + std::to_string(kSchemaApplicationID));
-  database.run("PRAGMA user_version = " + std::to_string(newest));
+  database.run("PRAGMA user_version = " + std::to_string(steps.size()));
+}
+
+std::optional<SchemaProblem> applySchema(Database& database,
+                                         const std::vector<std::string>& steps) {
+  if (isSchemaCurrent(database, steps)) return std::nullopt;  // nearly always, and without a lock
+  Transaction transaction(database, Transaction::Kind::writing);
+  if (const auto problem = schemaProblemOf(database, steps)) return problem;
+  runSchemaSteps(database, steps);
   transaction.commit();
   return std::nullopt;
 }

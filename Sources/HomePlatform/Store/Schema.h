@@ -22,6 +22,18 @@ enum class SchemaProblem {
   newer,    ///< It has been written by a version of the program that knows more steps.
 };
 
+/// Whether `database` has the version that `steps` lead to. Throws `DatabaseError`.
+[[nodiscard]] bool isSchemaCurrent(Database& database, const std::vector<std::string>& steps);
+
+/// Why `steps` cannot be run on `database`; none when they can, or when there is nothing to do.
+/// Throws `DatabaseError`.
+[[nodiscard]] std::optional<SchemaProblem> schemaProblemOf(Database& database,
+                                                           const std::vector<std::string>& steps);
+
+/// Runs those of `steps` that `database` lacks, within a writing transaction of the caller; only
+/// when there is no problem. Throws `DatabaseError`.
+void runSchemaSteps(Database& database, const std::vector<std::string>& steps);
+
 /// Brings `database` to the version that `steps` lead to, in one transaction; several processes may
 /// do so at the same time. Gives what is in the way, none when it is done. Throws `DatabaseError`.
 [[nodiscard]] std::optional<SchemaProblem> applySchema(Database& database,

@@ -7,6 +7,10 @@
 
 namespace nidus {
 
+/// The files of a data folder, beside that of the preferences.
+inline constexpr const char* kDatabaseFile = "home.db";
+inline constexpr const char* kVocabularyFile = "vocabulary.json";
+
 /// Makes sure that `folder` is there and may be written: it is made, readable by its owner alone,
 /// when it is missing. An existing folder is left as it is.
 [[nodiscard]] Status prepareDataFolder(const std::filesystem::path& folder);

@@ -24,6 +24,8 @@ class Preferences final : public NDPreferences {
  public:
   /// The domain whose booleans these preferences hold.
   static constexpr const char* kDomain = "com.corvane.nidusd";
+  /// Whether there are homes that the assistant may see.
+  static constexpr const char* kHomesConfigured = "kHomesConfigured";
   /// Of the file in its folder.
   static constexpr const char* kFileName = "preferences.json";
 
@@ -42,9 +44,6 @@ class Preferences final : public NDPreferences {
 
   /// The value of `key` as a boxed value; null when it is missing or nothing that can be boxed.
   [[nodiscard]] NDValueRef valueForKey(const std::string& key);
-
-  /// All values as they were read last.
-  [[nodiscard]] std::map<std::string, JsonValue> values();
 
   /// The container whose preferences these are: the folder of the file.
   [[nodiscard]] const std::string& containerPath() const { return containerPath_; }
