@@ -1,7 +1,6 @@
 #include "nidus/CommandLine.h"
 
 #include <CLI/CLI.hpp>
-#include <algorithm>
 #include <csignal>
 #include <memory>
 #include <utility>
@@ -59,8 +58,6 @@ class ParserSyntax final : public CommandSyntax {
                          const std::string& help) override {
     app_.add_option(name, target, help)->option_text("...")->required();
   }
-  void candidates(const std::string&, std::vector<Candidates>) override {}
-  void hide() override { app_.group(""); }
   void run(std::function<ExitStatus()> action) override {
     app_.callback([this, action = std::move(action)] { chosen_ = action; });
   }
@@ -71,13 +68,10 @@ class ParserSyntax final : public CommandSyntax {
   std::vector<std::unique_ptr<ParserSyntax>> below_;
 };
 
-}  // namespace
-
 void declareProgram(CommandSyntax& program, Workspace& workspace) {
   program.option("--data", "DIR", workspace.settings().dataFolder,
                  "The folder of the homes and preferences (else NIDUS_DATA, else nidus in the "
                  "user's data folder)");
-  program.candidates("--data", {{CandidateKind::files}});
   program.flag("--locked", workspace.settings().isLocked, "The device is locked");
   declareHome(program, workspace);
   declarePerform(program, workspace);
@@ -86,11 +80,8 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   declareVocabulary(program, workspace);
   declareReplay(program);
   declareDemo(program);
-  declareComplete(program, workspace);
-  declareCompletion(program);
+  declareDoctor(program, workspace);
 }
-
-namespace {
 
 /// The command that the arguments have led to: "nidus home".
 std::string commandOf(const CLI::App& app) {
@@ -109,12 +100,10 @@ ExitStatus reportUsage(const CLI::App& app, const CLI::ParseError& error) {
   return report({Failure::Kind::badInput, reason + "; see " + commandOf(app) + " --help"});
 }
 
-ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
+ExitStatus parseAndRun(CLI::App& app, int argc, const char* const* argv,
                        const std::function<ExitStatus()>& chosen) {
   try {
-    // The parser takes them from the end.
-    std::reverse(words.begin(), words.end());
-    app.parse(std::move(words));
+    app.parse(argc, argv);
   } catch (const CLI::CallForHelp&) {
     return printText(app.help());
   } catch (const CLI::CallForVersion& version) {
@@ -127,24 +116,17 @@ ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
 
 }  // namespace
 
-ExitStatus runCommand(std::vector<std::string> words,
-                      const std::function<void(CommandSyntax&)>& declare) {
-  CLI::App app("Lets an assistant's commands act on a home.", "nidus");
-  app.set_version_flag("--version", "nidus " NIDUS_VERSION);
-  app.footer(kFirstHelp);
-  std::function<ExitStatus()> chosen;
-  ParserSyntax program(app, chosen);
-  declare(program);
-  return parseAndRun(app, std::move(words), chosen);
-}
-
 int runCommandLine(int argc, const char* const* argv) {
   // A reader that has gone is an error of the write that meets it, not the end of the process.
   std::signal(SIGPIPE, SIG_IGN);
+  CLI::App app("Lets an assistant's commands act on a home.", "nidus");
+  app.set_version_flag("--version", "nidus " NIDUS_VERSION);
+  app.footer(kFirstHelp);
   Workspace workspace;
-  return static_cast<int>(runCommand({argv + 1, argv + argc}, [&workspace](CommandSyntax& program) {
-    declareProgram(program, workspace);
-  }));
+  std::function<ExitStatus()> chosen;
+  ParserSyntax program(app, chosen);
+  declareProgram(program, workspace);
+  return static_cast<int>(parseAndRun(app, argc, argv, chosen));
 }
 
 }  // namespace nidus

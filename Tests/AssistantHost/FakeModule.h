@@ -57,18 +57,10 @@ class FakeModule {
     return false;
   }
 
-  static bool readLogThreshold(NDLogThreshold& /*threshold*/, std::string& message) {
-    message = "no platform is registered";
-    return false;
-  }
-
   static inline FakeModule* current = nullptr;
   static constexpr NDAssistantModule kModule = {kNDAssistantModuleInterfaceVersion,
-                                                kNDAssistantModuleABI,
-                                                makeCommand,
-                                                makeSyncHandler,
-                                                gatherRecords,
-                                                readLogThreshold};
+                                                kNDAssistantModuleABI, makeCommand, makeSyncHandler,
+                                                gatherRecords};
 };
 
 }  // namespace nidus

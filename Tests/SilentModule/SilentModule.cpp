@@ -42,11 +42,6 @@ bool gatherRecords(std::function<void(const NDDictionaryList& records)> /*receiv
   return true;
 }
 
-bool readLogThreshold(nidus::NDLogThreshold& /*threshold*/, std::string& message) {
-  message = "this module has no log";
-  return false;
-}
-
 // NOLINTEND(performance-unnecessary-value-param)
 
 }  // namespace
@@ -55,10 +50,7 @@ bool readLogThreshold(nidus::NDLogThreshold& /*threshold*/, std::string& message
 extern "C" ND_EXPORT const nidus::NDAssistantModule* NDAssistantModuleEntry() {
   static constexpr nidus::NDAssistantModule kModule = {
       nidus::kNDAssistantModuleInterfaceVersion + NIDUS_INTERFACE_OFFSET,
-      nidus::kNDAssistantModuleABI,
-      nidus::makeCommand,
-      nidus::makeSyncHandler,
-      nidus::gatherRecords,
-      nidus::readLogThreshold};
+      nidus::kNDAssistantModuleABI, nidus::makeCommand, nidus::makeSyncHandler,
+      nidus::gatherRecords};
   return &kModule;
 }

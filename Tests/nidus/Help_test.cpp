@@ -14,7 +14,7 @@ struct HelpCase {
 TEST_F(ProgramTest, HelpsOnEachLevel) {
   const HelpCase table[] = {
       {{},
-       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo",
+       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo", "doctor",
         "Exit status"}},
       {{"home"}, {"import", "export", "show", "check", "--data"}},
       {{"home", "import"}, {"FILE", "--merge", "--data"}},
@@ -26,8 +26,8 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"records"}, {"record a line"}},
       {{"vocabulary"}, {"WORD", "--json", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
-      {{"completion"}, {"bash, zsh or fish", "Exit status"}},
       {{"demo"}, {"temporary folder"}},
+      {{"doctor"}, {"--json", "Example", "Exit status"}},
   };
   for (const HelpCase& help : table) {
     std::vector<std::string> arguments = help.command;

@@ -18,7 +18,6 @@ void declareRecords(CommandSyntax& program, Workspace& workspace);
 void declareVocabulary(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
-void declareComplete(CommandSyntax& program, Workspace& workspace);
-void declareCompletion(CommandSyntax& program);
+void declareDoctor(CommandSyntax& program, Workspace& workspace);
 
 }  // namespace nidus
