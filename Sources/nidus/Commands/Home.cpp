@@ -4,11 +4,14 @@
 namespace nidus {
 
 void declareHome(CommandSyntax& program, Workspace& workspace) {
-  CommandSyntax& home = program.command("home", "Reads, shows and replaces the homes", "");
+  CommandSyntax& home = program.command("home", "Shows, changes, reads and replaces the homes", "");
   declareHomeImport(home, workspace);
   declareHomeExport(home, workspace);
   declareHomeShow(home, workspace);
   declareHomeCheck(home);
+  declareHomeRename(home, workspace);
+  declareHomeMove(home, workspace);
+  declareHomeRemove(home, workspace);
 }
 
 }  // namespace nidus

@@ -1,0 +1,15 @@
+#pragma once
+
+#include "nidus/CommandSyntax.h"
+#include "nidus/HomeEditing/HomeObjects.h"
+
+namespace nidus {
+
+/// Declares the argument NAME and the option --home, which together name an object of the kind that
+/// `words` have; a home has no option --home. `words` live as long as the command.
+void declareObjectArguments(CommandSyntax& syntax, ObjectWords& words);
+
+/// "a room", "an accessory".
+[[nodiscard]] std::string withArticle(ObjectKind kind);
+
+}  // namespace nidus
