@@ -1,0 +1,90 @@
+#include "nidus/Terminal/Terminal.h"
+
+#include <sys/ioctl.h>
+#include <unigbrk.h>
+#include <unistd.h>
+#include <uniwidth.h>
+
+#include <cstdint>
+#include <cstdlib>
+#include <vector>
+
+namespace nidus {
+namespace {
+
+constexpr std::string_view kEllipsis = "…";
+
+const std::uint8_t* unitsOf(std::string_view text) {
+  return reinterpret_cast<const std::uint8_t*>(text.data());
+}
+
+bool wantsColour() {
+  const char* const refusal = std::getenv("NO_COLOR");
+  const char* const terminal = std::getenv("TERM");
+  const bool isRefused = refusal && *refusal != '\0';
+  return !isRefused && terminal && *terminal != '\0' && std::string_view(terminal) != "dumb";
+}
+
+TerminalStyle styleOf(int file) {
+  if (isatty(file) == 0) return {};
+  winsize size = {};
+  const bool isSizeKnown = ioctl(file, TIOCGWINSZ, &size) == 0;
+  return {wantsColour(), isSizeKnown ? size.ws_col : std::size_t{0}};
+}
+
+std::string_view codeOf(Colour colour) {
+  switch (colour) {
+    case Colour::title:
+      return "\x1b[1m";
+    case Colour::faint:
+      return "\x1b[2m";
+    case Colour::good:
+      return "\x1b[32m";
+    case Colour::warning:
+      return "\x1b[33m";
+    case Colour::bad:
+      return "\x1b[31m";
+    case Colour::none:
+      break;
+  }
+  return {};
+}
+
+/// How many bytes of `text` are whole characters, with all that combines with them, and take at
+/// most `cells` cells.
+std::size_t fittingSize(std::string_view text, std::size_t cells) {
+  std::vector<char> isStart(text.size());
+  u8_grapheme_breaks(unitsOf(text), text.size(), isStart.data());
+  std::size_t fitting = 0;
+  for (std::size_t end = 1; end < text.size(); ++end) {
+    if (isStart[end] == 0) continue;
+    if (cellsOf(text.substr(0, end)) > cells) break;
+    fitting = end;
+  }
+  return fitting;
+}
+
+}  // namespace
+
+TerminalStyle standardOutputStyle() { return styleOf(STDOUT_FILENO); }
+
+TerminalStyle standardErrorStyle() { return styleOf(STDERR_FILENO); }
+
+std::string coloured(std::string_view text, Colour colour, const TerminalStyle& style) {
+  if (!style.hasColour || colour == Colour::none || text.empty()) return std::string(text);
+  return std::string(codeOf(colour)).append(text).append("\x1b[0m");
+}
+
+std::size_t cellsOf(std::string_view text) {
+  const int cells = u8_width(unitsOf(text), text.size(), "UTF-8");
+  return cells > 0 ? static_cast<std::size_t>(cells) : 0;
+}
+
+std::string shortened(std::string_view text, std::size_t cells) {
+  if (cellsOf(text) <= cells) return std::string(text);
+  if (cells == 0) return {};
+  const std::string_view kept = text.substr(0, fittingSize(text, cells - cellsOf(kEllipsis)));
+  return std::string(kept.substr(0, kept.find_last_not_of(' ') + 1)).append(kEllipsis);
+}
+
+}  // namespace nidus
