@@ -7,16 +7,41 @@
 #include <system_error>
 
 namespace nidus {
+namespace {
+
+constexpr unsigned char byteOf(char c) { return static_cast<unsigned char>(c); }
+
+/// How many bytes of a control character `text` begins with; 0 when it begins with another one.
+std::size_t controlSize(std::string_view text) {
+  const unsigned char first = byteOf(text[0]);
+  if (first < 0x20 || first == 0x7f) return 1;
+  // U+0080 to U+009F, which terminals obey too.
+  const bool isSecondSet = first == 0xc2 && text.size() > 1 && byteOf(text[1]) < 0xa0;
+  return isSecondSet ? 2 : 0;
+}
+
+std::string escapeOf(std::string_view bytes) {
+  constexpr std::string_view kDigits = "0123456789abcdef";
+  std::string escape;
+  for (const char c : bytes) {
+    escape.append("\\x").append(1, kDigits[byteOf(c) >> 4U]).append(1, kDigits[byteOf(c) & 15U]);
+  }
+  return escape;
+}
+
+}  // namespace
+
 std::string onOneLine(std::string_view text) {
-  constexpr char kDigits[] = "0123456789abcdef";
   std::string line;
-  for (const char c : text) {
-    const auto byte = static_cast<unsigned char>(c);
-    if (byte >= 0x20 && byte != 0x7f) {
-      line += c;
+  while (!text.empty()) {
+    const std::size_t control = controlSize(text);
+    const std::size_t size = control == 0 ? 1 : control;
+    if (control == 0) {
+      line += text[0];
     } else {
-      line.append("\\x").append(1, kDigits[byte >> 4]).append(1, kDigits[byte & 15]);
+      line += escapeOf(text.substr(0, size));
     }
+    text.remove_prefix(size);
   }
   return line;
 }
