@@ -3,6 +3,7 @@
 #include <string>
 #include <vector>
 
+#include "HomePlatform/Metadata/Vocabulary.h"
 #include "PlatformModel/System/NDDictionary.h"
 #include "nidus/Orders/Order.h"
 #include "nidus/Terminal/Terminal.h"
@@ -13,8 +14,15 @@ namespace nidus {
 using Replies = std::vector<NDDictionary>;
 
 /// Shows the answer to an order to a person: for each reply a table of the objects and one sentence
-/// about the outcome. `replies` has one entry for each command of the order.
+/// about the outcome, in whole lines. `replies` has one entry for each command of the order; the
+/// vocabulary gives values their words and units. A reply that asks for an unlocked device comes
+/// first, in whatever order the replies came.
+///
+///     OBJECT        ROOM         HOME         POWER  OUTCOME
+///     Floor Lamp    Living Room  Beach House  on     ok
+///     Garage Light  Garage       Beach House         unreachable
+///     1 light set, 1 unreachable: Garage Light
 [[nodiscard]] std::string answerText(const Order& order, const std::vector<Replies>& replies,
-                                     const TerminalStyle& style);
+                                     const Vocabulary& vocabulary, const TerminalStyle& style);
 
 }  // namespace nidus
