@@ -2,6 +2,7 @@
 
 #include "Assistant/NDAssistantCommand.h"
 #include "Assistant/NDAssistantSyncHome.h"
+#include "Logging/WLOThreshold.h"
 #include "PlatformModel/Assistant/NDAssistantModule.h"
 #include "PlatformModel/NDPlatform.h"
 #include "PlatformModel/System/NDDeliveryHold.h"
@@ -56,9 +57,21 @@ bool gatherRecords(std::function<void(const NDDictionaryList&)> receive, std::st
   return false;
 }
 
+bool readLogThreshold(NDLogThreshold& threshold, std::string& message) try {
+  if (!hasPlatform(message)) return false;
+  threshold = readThreshold(*NDPlatform::registered());
+  return true;
+} catch (const std::exception& error) {
+  message = error.what();
+  return false;
+}
+
 constinit const NDAssistantModule kModule = {kNDAssistantModuleInterfaceVersion,
-                                             kNDAssistantModuleABI, &makeCommand, &makeSyncHandler,
-                                             &gatherRecords};
+                                             kNDAssistantModuleABI,
+                                             &makeCommand,
+                                             &makeSyncHandler,
+                                             &gatherRecords,
+                                             &readLogThreshold};
 
 }  // namespace
 }  // namespace nidus

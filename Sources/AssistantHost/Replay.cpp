@@ -17,8 +17,6 @@
 namespace nidus {
 namespace {
 
-constexpr const char kHomesConfigured[] = "kHomesConfigured";
-
 /// What the platform heard and said during one step. Everything runs on one thread.
 struct StepEvents {
   NDDictionaryList calls;
@@ -30,6 +28,7 @@ HomePlatformOptions optionsOf(const Scenario& scenario, const std::shared_ptr<St
   options.locked = scenario.locked;
   options.drainsOnCaller = true;
   options.metric = scenario.metric;
+  options.homes = scenario.homes;
   options.preferences = scenario.preferences;
   options.internalBuild = scenario.internalBuild;
   options.logSink = [events](const NDSystemLogMessage& message) {
@@ -39,15 +38,6 @@ HomePlatformOptions optionsOf(const Scenario& scenario, const std::shared_ptr<St
     events->calls.emplace_back(transcriptOf(call));
   };
   return options;
-}
-
-/// An import notes whether there are homes now; in a scenario its own preferences say so.
-Status importHomes(HomePlatform& platform, const Scenario& scenario) {
-  if (auto failure = platform.importHomes(scenario.homes, false)) return failure;
-  const auto configured = scenario.preferences.find(kHomesConfigured);
-  const bool isGiven = configured != scenario.preferences.end();
-  return platform.changePreferences(
-      {{kHomesConfigured, isGiven ? configured->second : JsonValue()}});
 }
 
 /// Performs the steps of one scenario and gives the line of each.
@@ -160,7 +150,6 @@ Status replay(const Scenario& scenario, const NDAssistantModule& module,
   const auto registered = RegisteredPlatform::open(optionsOf(scenario, events));
   if (!registered) return registered.failure();
   const auto& platform = (*registered)->platform();
-  if (auto failure = importHomes(*platform, scenario)) return failure;
   StepRunner runner(module, platform, events);
   return runSteps(runner, scenario, write);
 }

@@ -1,6 +1,7 @@
 #include "HomePlatform/HomePlatform.h"
 
 #include <iostream>
+#include <system_error>
 #include <utility>
 
 #include "HomePlatform/LocalHomePlatform.h"
@@ -27,6 +28,21 @@ void fillIn(HomePlatformOptions& options) {
   }
 }
 
+Result<Vocabulary> openVocabulary(HomePlatformOptions& options) {
+  if (!options.dataFolder && options.vocabulary) return std::move(*options.vocabulary);
+  return loadVocabulary(fileOf(options, kVocabularyFile));
+}
+
+Result<std::shared_ptr<HomeStore>> openStore(HomePlatformOptions& options) {
+  auto store = HomeStore::open(fileOf(options, kDatabaseFile));
+  if (!store) return store.failure();
+  const auto homes = std::exchange(options.homes, {});
+  if (!options.dataFolder && !homes.empty()) {
+    if (Status failure = (*store)->replaceHomes(homes)) return *failure;
+  }
+  return std::shared_ptr<HomeStore>(std::move(*store));
+}
+
 Result<std::shared_ptr<Preferences>> openPreferences(const HomePlatformOptions& options) {
   if (options.dataFolder) return Preferences::open(*options.dataFolder, options.failureHandler);
   return Preferences::inMemory(options.preferences, kMemoryContainer);
@@ -39,17 +55,22 @@ Result<std::shared_ptr<HomePlatform>> HomePlatform::open(HomePlatformOptions opt
   if (options.dataFolder) {
     if (Status failure = prepareDataFolder(*options.dataFolder)) return *failure;
   }
-  auto vocabulary = loadVocabulary(fileOf(options, kVocabularyFile));
+  auto vocabulary = openVocabulary(options);
   if (!vocabulary) return vocabulary.failure();
   auto preferences = openPreferences(options);
   if (!preferences) return preferences.failure();
-  auto store = HomeStore::open(fileOf(options, kDatabaseFile));
+  auto store = openStore(options);
   if (!store) return store.failure();
   LocalHomePlatform::Parts parts{std::move(*preferences),
                                  std::make_shared<MetadataMapper>(std::move(*vocabulary)),
                                  std::move(*store)};
   return std::shared_ptr<HomePlatform>(
       std::make_shared<LocalHomePlatform>(std::move(options), std::move(parts)));
+}
+
+bool HomePlatform::hasDatabase(const std::filesystem::path& folder) {
+  std::error_code ignored;
+  return std::filesystem::exists(folder / kDatabaseFile, ignored);
 }
 
 }  // namespace nidus

@@ -22,7 +22,7 @@ namespace nidus {
 /// How a platform is opened.
 struct HomePlatformOptions {
   /// Where the database, the preferences and the vocabulary are; it is made when it is missing.
-  /// None keeps everything in memory, uses the built-in vocabulary alone and touches no file.
+  /// None keeps everything in memory and touches no file.
   std::optional<std::filesystem::path> dataFolder = std::nullopt;
   /// Whether the device is locked.
   bool locked = false;
@@ -33,7 +33,11 @@ struct HomePlatformOptions {
   std::shared_ptr<NDClock> clock = nullptr;
   /// The metric flag; none takes it from the environment's locale.
   std::optional<bool> metric = std::nullopt;
-  /// Preferences of a platform in memory.
+  /// Homes of a platform in memory, as a home document may hold them.
+  std::vector<HomeData> homes = {};
+  /// The vocabulary of a platform in memory; none takes the built-in one.
+  std::optional<Vocabulary> vocabulary = std::nullopt;
+  /// Preferences of a platform in memory, "kHomesConfigured" included.
   std::map<std::string, JsonValue> preferences = {};
   /// The "InternalBuild" answer of a platform in memory.
   bool internalBuild = false;
@@ -59,6 +63,8 @@ struct HomePlatformOptions {
 class HomePlatform : public NDPlatform {
  public:
   [[nodiscard]] static Result<std::shared_ptr<HomePlatform>> open(HomePlatformOptions options);
+  /// Whether opening `folder` would find a home database there; looks without making anything.
+  [[nodiscard]] static bool hasDatabase(const std::filesystem::path& folder);
 
   /// Puts `homes` into the database: in place of all (or, with `merge`, of those of the same UUID)
   /// in one transaction; afterwards sets "kHomesConfigured" to whether there are homes.
@@ -76,6 +82,8 @@ class HomePlatform : public NDPlatform {
   virtual void setLocked(bool locked) = 0;
   /// Managers that are created from then on never report their homes, or do again.
   virtual void setSilent(bool silent) = 0;
+  /// The preferences as they were read last, whether anything reads them or not.
+  [[nodiscard]] virtual std::map<std::string, JsonValue> preferenceValues() = 0;
   /// Changes preferences (null removes the key) and posts the change notification.
   [[nodiscard]] virtual Status changePreferences(
       const std::map<std::string, JsonValue>& changes) = 0;

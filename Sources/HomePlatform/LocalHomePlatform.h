@@ -56,6 +56,9 @@ class LocalHomePlatform final : public HomePlatform {
   }
   void setLocked(bool locked) override { deviceLock_->setLocked(locked); }
   void setSilent(bool silent) override { isSilent_.store(silent); }
+  [[nodiscard]] std::map<std::string, JsonValue> preferenceValues() override {
+    return preferences_->values();
+  }
   [[nodiscard]] Status changePreferences(const std::map<std::string, JsonValue>& changes) override;
   void drain() override { queues_->drain(); }
   void shutDown() override;

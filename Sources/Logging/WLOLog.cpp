@@ -1,12 +1,11 @@
 #include "Logging/WLOLog.h"
 
-#include <algorithm>
 #include <array>
 #include <atomic>
 #include <cassert>
-#include <limits>
 #include <memory>
 
+#include "Logging/WLOThreshold.h"
 #include "PlatformModel/NDPlatform.h"
 #include "PlatformModel/System/NDRunOnce.h"
 
@@ -20,13 +19,7 @@ namespace {
 constexpr std::array kLevelNames = {"0", "1", "2", "3", "4", "5", "6", "7"};
 
 constexpr const char* kFacility = "com.corvane.Nidus";
-constexpr const char* kDeveloperLevelKey = "NidusDeveloperLogLevel";
 constexpr const char* kPreferencesDidChange = "com.corvane.managedconfiguration.defaultsdidchange";
-constexpr std::int64_t kLeastLevelTakenAsItIs = 3;
-constexpr std::int64_t kGreatestDeveloperLevel = 7;
-constexpr std::int64_t kGreatestLevel = std::numeric_limits<std::int32_t>::max();
-constexpr std::int64_t kInternalFloor = 6;
-constexpr std::int64_t kCustomerFloor = 4;
 
 /// What stays open for the life of the process. Never destroyed: threads may log to the very end.
 struct Connection {
@@ -36,23 +29,7 @@ struct Connection {
 
 constinit std::atomic<std::int32_t> currentLevel{0};
 constinit Connection* connection = nullptr;
-constinit std::atomic<bool> isInternalBuild{false};
 constinit NDRunOnce connectOnce;
-constinit NDRunOnce internalBuildOnce;
-
-void askForInternalBuild(NDPlatform& platform) {
-  const NDValueRef answer = platform.deviceInformation()->answerForQuery("InternalBuild");
-  if (answer && answer->isBoolean()) isInternalBuild = answer->boolValue();
-}
-
-std::int64_t levelFromPreferences(NDPreferences& preferences) {
-  const std::int64_t level = preferences.integerForKey(kWLOLogLevelKey);
-  if (level >= kLeastLevelTakenAsItIs) return std::min(level, kGreatestLevel);
-  const std::int64_t floor = isInternalBuild ? kInternalFloor : kCustomerFloor;
-  const std::int64_t developerLevel = preferences.integerForKey(kDeveloperLevelKey);
-  const bool isInRange = developerLevel >= floor && developerLevel <= kGreatestDeveloperLevel;
-  return isInRange ? developerLevel : floor;
-}
 
 /// Lets all severities up to `level` pass.
 std::uint32_t maskUpTo(std::int32_t level) {
@@ -64,10 +41,7 @@ std::uint32_t maskUpTo(std::int32_t level) {
 void readLevel() {
   const auto platform = NDPlatform::registered();
   if (!platform) return;
-  const auto preferences = platform->preferences();
-  preferences->synchronize();
-  internalBuildOnce.run([&platform] { askForInternalBuild(*platform); });
-  const auto level = static_cast<std::int32_t>(levelFromPreferences(*preferences));
+  const std::int32_t level = readThreshold(*platform).level;
   std::int32_t known = currentLevel.load();
   if (level == known) return;
   if (currentLevel.compare_exchange_strong(known, level)) {

@@ -1,6 +1,7 @@
 #include "nidus/CommandLine.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <csignal>
 #include <memory>
 #include <utility>
@@ -58,6 +59,8 @@ class ParserSyntax final : public CommandSyntax {
                          const std::string& help) override {
     app_.add_option(name, target, help)->option_text("...")->required();
   }
+  void candidates(const std::string&, std::vector<Candidates>) override {}
+  void hide() override { app_.group(""); }
   void run(std::function<ExitStatus()> action) override {
     app_.callback([this, action = std::move(action)] { chosen_ = action; });
   }
@@ -68,10 +71,13 @@ class ParserSyntax final : public CommandSyntax {
   std::vector<std::unique_ptr<ParserSyntax>> below_;
 };
 
+}  // namespace
+
 void declareProgram(CommandSyntax& program, Workspace& workspace) {
   program.option("--data", "DIR", workspace.settings().dataFolder,
                  "The folder of the homes and preferences (else NIDUS_DATA, else nidus in the "
                  "user's data folder)");
+  program.candidates("--data", {{CandidateKind::files}});
   program.flag("--locked", workspace.settings().isLocked, "The device is locked");
   declareHome(program, workspace);
   declarePerform(program, workspace);
@@ -81,7 +87,11 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   declareReplay(program);
   declareDemo(program);
   declareDoctor(program, workspace);
+  declareComplete(program, workspace);
+  declareCompletion(program);
 }
+
+namespace {
 
 /// The command that the arguments have led to: "nidus home".
 std::string commandOf(const CLI::App& app) {
@@ -100,10 +110,12 @@ ExitStatus reportUsage(const CLI::App& app, const CLI::ParseError& error) {
   return report({Failure::Kind::badInput, reason + "; see " + commandOf(app) + " --help"});
 }
 
-ExitStatus parseAndRun(CLI::App& app, int argc, const char* const* argv,
+ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
                        const std::function<ExitStatus()>& chosen) {
   try {
-    app.parse(argc, argv);
+    // The parser takes them from the end.
+    std::reverse(words.begin(), words.end());
+    app.parse(std::move(words));
   } catch (const CLI::CallForHelp&) {
     return printText(app.help());
   } catch (const CLI::CallForVersion& version) {
@@ -116,17 +128,24 @@ ExitStatus parseAndRun(CLI::App& app, int argc, const char* const* argv,
 
 }  // namespace
 
-int runCommandLine(int argc, const char* const* argv) {
-  // A reader that has gone is an error of the write that meets it, not the end of the process.
-  std::signal(SIGPIPE, SIG_IGN);
+ExitStatus runCommand(std::vector<std::string> words,
+                      const std::function<void(CommandSyntax&)>& declare) {
   CLI::App app("Lets an assistant's commands act on a home.", "nidus");
   app.set_version_flag("--version", "nidus " NIDUS_VERSION);
   app.footer(kFirstHelp);
-  Workspace workspace;
   std::function<ExitStatus()> chosen;
   ParserSyntax program(app, chosen);
-  declareProgram(program, workspace);
-  return static_cast<int>(parseAndRun(app, argc, argv, chosen));
+  declare(program);
+  return parseAndRun(app, std::move(words), chosen);
+}
+
+int runCommandLine(int argc, const char* const* argv) {
+  // A reader that has gone is an error of the write that meets it, not the end of the process.
+  std::signal(SIGPIPE, SIG_IGN);
+  Workspace workspace;
+  return static_cast<int>(runCommand({argv + 1, argv + argc}, [&workspace](CommandSyntax& program) {
+    declareProgram(program, workspace);
+  }));
 }
 
 }  // namespace nidus

@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "nidus/Candidates.h"
 #include "nidus/ExitStatus.h"
 
 namespace nidus {
@@ -37,6 +38,11 @@ class CommandSyntax {
   /// Adds an argument of one word or more, all of them to the end.
   virtual void requiredArguments(const std::string& name, std::vector<std::string>& target,
                                  const std::string& help) = 0;
+  /// Says what may stand for the option or argument `name`, which is declared already. An argument
+  /// of several words has one entry for each word; the last one is also for all that follow.
+  virtual void candidates(const std::string& name, std::vector<Candidates> ofWords) = 0;
+  /// Leaves this command, which is for programs, out of the help and of completion.
+  virtual void hide() = 0;
   /// Sets what runs when this command is the one that was given.
   virtual void run(std::function<ExitStatus()> action) = 0;
 };

@@ -57,10 +57,18 @@ class FakeModule {
     return false;
   }
 
+  static bool readLogThreshold(NDLogThreshold& /*threshold*/, std::string& message) {
+    message = "no platform is registered";
+    return false;
+  }
+
   static inline FakeModule* current = nullptr;
   static constexpr NDAssistantModule kModule = {kNDAssistantModuleInterfaceVersion,
-                                                kNDAssistantModuleABI, makeCommand, makeSyncHandler,
-                                                gatherRecords};
+                                                kNDAssistantModuleABI,
+                                                makeCommand,
+                                                makeSyncHandler,
+                                                gatherRecords,
+                                                readLogThreshold};
 };
 
 }  // namespace nidus

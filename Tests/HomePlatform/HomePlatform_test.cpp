@@ -302,6 +302,35 @@ TEST(HomePlatformTest, FailedEditChangesNothing) {
   EXPECT_TRUE(isConfigured(*platform));
 }
 
+TEST(HomePlatformTest, MemoryHoldsGivenHomesAndWords) {
+  HomePlatformOptions options = onCaller();
+  options.homes = {sampleHome()};
+  options.vocabulary = Vocabulary{{{"SAUNA", "my.sauna"}}, {}, {}};
+  options.preferences = {{"kHomesConfigured", JsonValue{false}}};
+  const OpenPlatform platform(options);
+  EXPECT_EQ(platform.homes().size(), 1U);
+  EXPECT_EQ(platform->metadata()->mapToAssistantServiceName("my.sauna"), "SAUNA");
+  EXPECT_FALSE(platform->metadata()->mapFromAssistantServiceName("LIGHT"));
+  EXPECT_FALSE(isConfigured(*platform));
+}
+
+TEST(HomePlatformTest, FolderIgnoresHomesForMemory) {
+  const TestFolder folder;
+  HomePlatformOptions options = inFolder(folder);
+  options.homes = {sampleHome()};
+  options.vocabulary = Vocabulary();
+  const OpenPlatform platform(options);
+  EXPECT_TRUE(platform->exportHomes()->empty());
+  EXPECT_FALSE(platform->vocabulary().isEmpty());
+}
+
+TEST(HomePlatformTest, TellsAllPreferences) {
+  const TestFolder folder;
+  const OpenPlatform platform(inFolder(folder));
+  ASSERT_FALSE(platform->changePreferences({{"NidusLogLevel", JsonValue{std::int64_t{7}}}}));
+  EXPECT_EQ(platform->preferenceValues().at("NidusLogLevel"), JsonValue{std::int64_t{7}});
+}
+
 TEST(HomePlatformTest, DamagedPreferencesKeepHomesAsTheyAre) {
   const TestFolder folder;
   const OpenPlatform platform(inFolder(folder));

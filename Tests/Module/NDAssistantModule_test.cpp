@@ -86,11 +86,13 @@ TEST(NDAssistantModuleTest, IsNotUnloaded) {
 
 TEST(NDAssistantModuleTest, WithoutPlatformFactoriesSayWhy) {
   const NDAssistantModule& module = openModule();
-  Texts messages(3);
+  Texts messages(4);
   bool isReceived = false;
+  NDLogThreshold threshold;
   EXPECT_FALSE(module.makeCommand(Request(), nullptr, messages[0]));
   EXPECT_FALSE(module.makeSyncHandler(messages[1]));
   EXPECT_FALSE(module.gatherRecords([&](const auto&) { isReceived = true; }, messages[2]));
+  EXPECT_FALSE(module.readLogThreshold(threshold, messages[3]));
   EXPECT_THAT(messages, ::testing::Each(HasSubstr("no home platform is registered")));
   EXPECT_FALSE(isReceived);
 }
@@ -142,6 +144,17 @@ TEST_F(OpenModuleTest, OpeningShowsNothing) {
     EXPECT_THAT(platform().testLog().openings(), IsEmpty());
     EXPECT_THAT(platform().testNotifications().registrations(), IsEmpty());
     EXPECT_EQ(platform().deviceQueries(), 0U);
+  });
+}
+
+TEST_F(OpenModuleTest, TellsWhatItLogs) {
+  inFreshProcess([] {
+    NDLogThreshold threshold;
+    std::string message;
+    platform().testPreferences().setInteger("NidusLogLevel", 7);
+    EXPECT_TRUE(openModule().readLogThreshold(threshold, message));
+    EXPECT_EQ(threshold.level, 7);
+    EXPECT_EQ(threshold.rule, NDLogThreshold::Rule::level);
   });
 }
 

@@ -42,6 +42,11 @@ bool gatherRecords(std::function<void(const NDDictionaryList& records)> /*receiv
   return true;
 }
 
+bool readLogThreshold(nidus::NDLogThreshold& /*threshold*/, std::string& message) {
+  message = "this module has no log";
+  return false;
+}
+
 // NOLINTEND(performance-unnecessary-value-param)
 
 }  // namespace
@@ -50,7 +55,10 @@ bool gatherRecords(std::function<void(const NDDictionaryList& records)> /*receiv
 extern "C" ND_EXPORT const nidus::NDAssistantModule* NDAssistantModuleEntry() {
   static constexpr nidus::NDAssistantModule kModule = {
       nidus::kNDAssistantModuleInterfaceVersion + NIDUS_INTERFACE_OFFSET,
-      nidus::kNDAssistantModuleABI, nidus::makeCommand, nidus::makeSyncHandler,
-      nidus::gatherRecords};
+      nidus::kNDAssistantModuleABI,
+      nidus::makeCommand,
+      nidus::makeSyncHandler,
+      nidus::gatherRecords,
+      nidus::readLogThreshold};
   return &kModule;
 }

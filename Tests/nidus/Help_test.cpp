@@ -34,6 +34,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"records"}, {"record a line"}},
       {{"vocabulary"}, {"WORD", "--json", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
+      {{"completion"}, {"bash, zsh or fish", "Exit status"}},
       {{"demo"}, {"temporary folder"}},
       {{"doctor"}, {"--json", "Example", "Exit status"}},
   };

@@ -91,6 +91,11 @@ NDValueRef Preferences::valueForKey(const std::string& key) {
   return value ? std::visit(Boxing(), value->content) : nullptr;
 }
 
+std::map<std::string, JsonValue> Preferences::values() {
+  const NDLock lock(mutex_);
+  return {content_.values.begin(), content_.values.end()};
+}
+
 Status Preferences::change(const std::map<std::string, JsonValue>& changes) {
   if (!file_) {
     const NDLock lock(mutex_);

@@ -45,6 +45,9 @@ class Preferences final : public NDPreferences {
   /// The value of `key` as a boxed value; null when it is missing or nothing that can be boxed.
   [[nodiscard]] NDValueRef valueForKey(const std::string& key);
 
+  /// All values as they were read last.
+  [[nodiscard]] std::map<std::string, JsonValue> values();
+
   /// The container whose preferences these are: the folder of the file.
   [[nodiscard]] const std::string& containerPath() const { return containerPath_; }
 

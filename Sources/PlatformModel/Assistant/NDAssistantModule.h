@@ -9,6 +9,7 @@
 
 #include "PlatformModel/Assistant/AFServiceCommand.h"
 #include "PlatformModel/Assistant/AFSyncHandler.h"
+#include "PlatformModel/Assistant/NDLogThreshold.h"
 #include "PlatformModel/Assistant/VAHACommand.h"
 #include "PlatformModel/Home/NDCharacteristic.h"
 #include "PlatformModel/System/NDDictionary.h"
@@ -30,7 +31,7 @@ class ND_EXPORT NDAssistantCommandObserver {
 
 /// The version of everything that crosses the border between a host and the module. It grows with
 /// each change of `PlatformModel` or of the struct below.
-inline constexpr std::uint32_t kNDAssistantModuleInterfaceVersion = 1;
+inline constexpr std::uint32_t kNDAssistantModuleInterfaceVersion = 2;
 
 #define ND_TEXT_OF(x) #x
 #define ND_TEXT(x) ND_TEXT_OF(x)
@@ -60,6 +61,9 @@ struct NDAssistantModule {
   /// False, with the reason in `message`, as above; `receive` is then dropped. It must not throw.
   bool (*gatherRecords)(std::function<void(const NDDictionaryList& records)> receive,
                         std::string& message);
+  /// Reads from the preferences, as they are now, which messages the plug-in logs and why. False,
+  /// with the reason in `message`, as above; `threshold` is then left as it was.
+  bool (*readLogThreshold)(NDLogThreshold& threshold, std::string& message);
 };
 
 /// The name of the module's one entry, of type `NDAssistantModuleEntryFunction`.

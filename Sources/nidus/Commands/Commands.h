@@ -22,5 +22,7 @@ void declareVocabulary(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
 void declareDoctor(CommandSyntax& program, Workspace& workspace);
+void declareComplete(CommandSyntax& program, Workspace& workspace);
+void declareCompletion(CommandSyntax& program);
 
 }  // namespace nidus

@@ -21,6 +21,7 @@ void declareHomeCheck(CommandSyntax& home) {
   CommandSyntax& syntax = home.command("check", "Checks a home document and changes nothing",
                                        "Says what is wrong and where, as a JSON pointer.");
   syntax.requiredArgument("FILE", *file, "A home document; - reads standard input");
+  syntax.candidates("FILE", {{CandidateKind::files}});
   syntax.run([file] { return checkHomes(*file); });
 }
 

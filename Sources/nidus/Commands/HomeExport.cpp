@@ -37,6 +37,7 @@ void declareHomeExport(CommandSyntax& home, Workspace& workspace) {
       home.command("export", "Writes all homes as a document",
                    "A file is replaced whole or not at all. The document can be imported again.");
   syntax.argument("FILE", *file, "Where to write; standard output when it is left out or -");
+  syntax.candidates("FILE", {{CandidateKind::files}});
   syntax.run([file, &workspace] { return exportHomes(*file, workspace); });
 }
 

@@ -34,6 +34,7 @@ void declareHomeImport(CommandSyntax& home, Workspace& workspace) {
                    "The document is checked whole before anything is changed. Try it first with "
                    "nidus home check FILE.");
   syntax.requiredArgument("FILE", options->file, "A home document; - reads standard input");
+  syntax.candidates("FILE", {{CandidateKind::files}});
   syntax.flag("--merge", options->merges,
               "Replace only the homes of the same UUID and keep the others");
   syntax.run([options, &workspace] { return importHomes(*options, workspace); });

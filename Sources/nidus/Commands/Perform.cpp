@@ -114,6 +114,7 @@ void declarePerform(CommandSyntax& program, Workspace& workspace) {
       "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform\n"
       "failed; the highest of all commands.");
   syntax.argument("FILE", *file, "The commands; standard input when it is left out or -");
+  syntax.candidates("FILE", {{CandidateKind::files}});
   syntax.run([file, &workspace] {
     return *file == "-" ? performInput(workspace) : performFile(*file, workspace);
   });

@@ -27,6 +27,7 @@ void declareReplay(CommandSyntax& program) {
       "replay", "Runs a scripted scenario and prints its transcript",
       "The scenario runs on homes in memory; nothing of the data folder is read or written.");
   syntax.requiredArgument("SCENARIO", *file, "A scenario document");
+  syntax.candidates("SCENARIO", {{CandidateKind::files}});
   syntax.run([file] { return replayFile(*file); });
 }
 

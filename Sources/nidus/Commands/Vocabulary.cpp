@@ -51,6 +51,7 @@ void declareVocabulary(CommandSyntax& program, Workspace& workspace) {
       "  nidus vocabulary climate\n\n"
       "Exit status: 0 success, 2 no such word, 4 the platform failed.");
   syntax.argument("WORD", options->word, "The word to show, in either case");
+  syntax.candidates("WORD", {{CandidateKind::attributes, CandidateKind::serviceTypes}});
   syntax.flag("--json", options->isJson, "Write a vocabulary document, as vocabulary.json is");
   syntax.run([options, &workspace] { return showVocabulary(*options, workspace); });
 }

@@ -85,6 +85,14 @@ TEST_F(PreferencesTest, BoxesWhatStandsThere) {
   EXPECT_FALSE(preferences_->valueForKey("list"));
 }
 
+TEST_F(PreferencesTest, GivesAllValues) {
+  open(R"({"yes": true, "list": [1]})");
+  const auto values = preferences_->values();
+  EXPECT_EQ(values.size(), 2U);
+  EXPECT_EQ(values.at("yes"), JsonValue{true});
+  EXPECT_EQ(values.at("list"), JsonValue{JsonValue::Array{JsonValue{std::int64_t{1}}}});
+}
+
 TEST_F(PreferencesTest, RefusesDamagedFileAtOpen) {
   for (const char* text : {"", "[]", "{\"a\": }", "{} {}", "{\"a\": 1, \"a\": 2}"}) {
     SCOPED_TRACE(text);
