@@ -43,7 +43,7 @@ struct Order {
     run,     ///< A scene.
   };
   Kind kind = Kind::get;
-  std::string attribute;             ///< The assistant's name.
+  std::string attribute;             ///< The assistant's name; empty: only which objects.
   std::vector<CommandRef> commands;  ///< One, but for limits; none is null.
 };
 

@@ -1,0 +1,20 @@
+#include "nidus/Orders/OrderOptions.h"
+
+namespace nidus {
+
+void declareFilterOptions(CommandSyntax& syntax, OrderFilter& filter) {
+  syntax.option("--home", "NAME", filter.home,
+                "In the home of this name; else in the primary one, or the only one");
+  syntax.option("--room", "NAME", filter.room, "In the room of this name");
+  syntax.option("--zone", "NAME", filter.zone, "In the rooms of this zone");
+  syntax.option("--group", "NAME", filter.group, "In the service group of this name");
+  syntax.option("--service", "NAME", filter.service, "The services of this name");
+  syntax.option("--scene", "NAME", filter.scene, "The scene of this name");
+  syntax.option("--type", "TYPE", filter.type,
+                "Services of this type, such as light; nidus vocabulary lists them");
+  syntax.option("--entity", "KIND", filter.entity,
+                "Objects of this kind: home, room, zone, group, service, scene or trigger; else "
+                "services");
+}
+
+}  // namespace nidus

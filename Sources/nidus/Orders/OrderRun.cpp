@@ -1,0 +1,33 @@
+#include "nidus/Orders/OrderRun.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "nidus/Outcome.h"
+
+namespace nidus {
+
+Result<Order> readOrderFor(Session& session, const OrderWords& words) {
+  HomePlatform& platform = session.platform();
+  const bool isMetric = platform.locale()->usesMetricSystem().value_or(false);
+  return readOrder(words, platform.vocabulary(), isMetric);
+}
+
+Result<std::vector<Replies>> performOrder(Session& session, const Order& order) {
+  std::vector<Replies> all;
+  for (const CommandRef& command : order.commands) {
+    auto replies = session.runner().perform(*command);
+    if (!replies) return replies.failure();
+    all.push_back(std::move(*replies));
+  }
+  return all;
+}
+
+ExitStatus statusOf(const Order& order, const std::vector<Replies>& replies) {
+  std::vector<ExitStatus> statuses;
+  for (const Replies& ofCommand : replies) statuses.push_back(statusOf(ofCommand));
+  const auto [least, greatest] = std::minmax_element(statuses.begin(), statuses.end());
+  return order.kind == Order::Kind::limits ? *least : *greatest;
+}
+
+}  // namespace nidus
