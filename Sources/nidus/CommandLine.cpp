@@ -55,8 +55,8 @@ class ParserSyntax final : public CommandSyntax {
                         const std::string& help) override {
     app_.add_option(name, target, help)->option_text(" ")->required();
   }
-  void arguments(const std::string& name, std::vector<std::string>& target,
-                 const std::string& help) override {
+  void optionalArguments(const std::string& name, std::vector<std::string>& target,
+                         const std::string& help) override {
     app_.add_option(name, target, help)->option_text("...");
   }
   void requiredArguments(const std::string& name, std::vector<std::string>& target,

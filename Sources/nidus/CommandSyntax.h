@@ -36,8 +36,8 @@ class CommandSyntax {
   virtual void requiredArgument(const std::string& name, std::string& target,
                                 const std::string& help) = 0;
   /// Adds an argument of any number of words, all of them to the end, and one of a word or more.
-  virtual void arguments(const std::string& name, std::vector<std::string>& target,
-                         const std::string& help) = 0;
+  virtual void optionalArguments(const std::string& name, std::vector<std::string>& target,
+                                 const std::string& help) = 0;
   virtual void requiredArguments(const std::string& name, std::vector<std::string>& target,
                                  const std::string& help) = 0;
   /// Says what may stand for the option or argument `name`, which is declared already. An argument

@@ -48,9 +48,14 @@ void CommandOutline::requiredArgument(const std::string& name, std::string& targ
   argument(name, target, help);
 }
 
-void CommandOutline::requiredArguments(const std::string& name, std::vector<std::string>&,
+void CommandOutline::optionalArguments(const std::string& name, std::vector<std::string>&,
                                        const std::string&) {
   arguments_.push_back({.names = {name}, .takesAllWords = true});
+}
+
+void CommandOutline::requiredArguments(const std::string& name, std::vector<std::string>& target,
+                                       const std::string& help) {
+  optionalArguments(name, target, help);
 }
 
 void CommandOutline::candidates(const std::string& name, std::vector<Candidates> ofWords) {

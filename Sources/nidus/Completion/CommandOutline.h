@@ -37,6 +37,8 @@ class CommandOutline final : public CommandSyntax {
   void argument(const std::string& name, std::string& target, const std::string& help) override;
   void requiredArgument(const std::string& name, std::string& target,
                         const std::string& help) override;
+  void optionalArguments(const std::string& name, std::vector<std::string>& target,
+                         const std::string& help) override;
   void requiredArguments(const std::string& name, std::vector<std::string>& target,
                          const std::string& help) override;
   void candidates(const std::string& name, std::vector<Candidates> ofWords) override;
