@@ -1,0 +1,311 @@
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <functional>
+#include <string>
+
+#include "HomePlatform/PlatformProbe.h"
+#include "HomePlatform/SampleHome.h"
+#include "HomePlatform/Store/Database.h"
+#include "HomePlatform/Store/HomeStore.h"
+#include "HomePlatform/Store/Schema.h"
+#include "HomePlatform/Support/RandomHome.h"
+#include "Support/FaultyDisk.h"
+#include "Support/FaultyMemory.h"
+#include "Support/TestFolder.h"
+
+namespace nidus {
+namespace {
+
+namespace fs = std::filesystem;
+
+constexpr std::chrono::milliseconds kNoWaiting{0};
+
+std::string databaseIn(const fs::path& folder) { return (folder / "home.db").string(); }
+
+/// What the engine finds wrong with the file; "ok" when there is nothing.
+std::string integrityOf(const fs::path& folder) {
+  Database database(databaseIn(folder), kNoWaiting);
+  Statement check(database, "PRAGMA integrity_check");
+  check.step();
+  const std::string result(check.text(0));
+  Statement references(database, "PRAGMA foreign_key_check");
+  return references.step() ? "a reference to nothing" : result;
+}
+
+std::string homesIn(const fs::path& folder) {
+  const auto store = HomeStore::open(databaseIn(folder), kNoWaiting);
+  if (!store) return store.failure().message;
+  const auto homes = (*store)->loadHomes();
+  return homes ? documentOf(*homes) : homes.failure().message;
+}
+
+/// A change of the database that has to be made whole or not at all.
+struct Change {
+  const char* name;
+  /// Makes the state before the change; empty for a folder without a database.
+  std::function<void(const fs::path& folder)> begin;
+  /// Opens the database and changes it; gives whether it was answered as done.
+  std::function<bool(const fs::path& folder)> make;
+  std::function<std::string(const fs::path& folder)> contents = homesIn;
+};
+
+void PrintTo(const Change& change, std::ostream* out) { *out << change.name; }
+
+using StoreAction = std::function<Status(HomeStore& store)>;
+
+std::function<bool(const fs::path&)> withStore(StoreAction action) {
+  return [action = std::move(action)](const fs::path& folder) {
+    const auto store = HomeStore::open(databaseIn(folder), kNoWaiting);
+    return store && !action(**store);
+  };
+}
+
+/// The sample home, with a scene that writes two values.
+HomeData homeWithScene() {
+  HomeData home = sampleHome();
+  home.actionSets.at(0).actions = {{powerAddress(), NDValue::boolean(true)},
+                                   {brightnessAddress(), NDValue::integer(77)}};
+  return home;
+}
+
+void beginWithHome(const fs::path& folder) {
+  const auto store = HomeStore::open(databaseIn(folder));
+  ASSERT_TRUE(store) << store.failure().message;
+  ASSERT_FALSE((*store)->replaceHomes({homeWithScene(), RandomHome(1).home()}));
+}
+
+Status importRandomHomes(HomeStore& store) {
+  return store.replaceHomes({RandomHome(2).home(), RandomHome(3).home()});
+}
+
+Status mergeRandomHome(HomeStore& store) {
+  HomeData changed = sampleHome();
+  changed.name = "Renamed";
+  return store.mergeHomes({changed, RandomHome(4).home()});
+}
+
+Status writeTwoValues(HomeStore& store) {
+  const NDUUID home = uuidOf(kHomeID);
+  const NDValueRef brightness = NDValue::integer(13);
+  const NDValueRef power = NDValue::boolean(true);
+  return store.writeValues(
+      {{home, brightnessAddress(), brightness, brightness}, {home, powerAddress(), power, power}});
+}
+
+bool runScene(const fs::path& folder) {
+  HomePlatformOptions options;
+  options.dataFolder = folder;
+  options.drainsOnCaller = true;
+  options.failureHandler = [](const Failure& /*failure*/) {};
+  const auto platform = HomePlatform::open(std::move(options));
+  if (!platform) return false;
+  const auto manager = (*platform)->createHomeManager();
+  const auto delegate = std::make_shared<DelegateProbe>();
+  manager->setDelegate(delegate);
+  (*platform)->drain();
+  const bool isDone = !delegate->homes.empty() && execute(**platform, delegate->homes[0]) == 0;
+  (*platform)->shutDown();
+  return isDone;
+}
+
+/// The steps of a schema that has a later version than the database.
+std::vector<std::string> stepsWithMigration() {
+  std::vector<std::string> steps = schemaSteps();
+  steps.emplace_back(
+      "ALTER TABLE room ADD COLUMN colour TEXT NOT NULL DEFAULT 'white';"
+      "CREATE TABLE note (home INTEGER NOT NULL REFERENCES home ON DELETE CASCADE, text TEXT);"
+      "INSERT INTO note SELECT id, name FROM home;"
+      "UPDATE accessory SET name = name || '!'");
+  return steps;
+}
+
+bool migrate(const fs::path& folder) {
+  try {
+    Database database(databaseIn(folder), kNoWaiting);
+    return !applySchema(database, stepsWithMigration());
+  } catch (const DatabaseError&) {
+    return false;
+  }
+}
+
+std::string migratedContents(const fs::path& folder) {
+  Database database(databaseIn(folder), kNoWaiting);
+  Statement names(database, "SELECT group_concat(name) FROM accessory");
+  names.step();
+  const std::int64_t columns =
+      database.number("SELECT count(*) FROM pragma_table_info('room') WHERE name = 'colour'");
+  return std::to_string(database.number("PRAGMA user_version")) + ' ' + std::to_string(columns) +
+         ' ' + std::string(names.text(0));
+}
+
+const Change kChanges[] = {
+    {"creation", nullptr, withStore([](HomeStore& /*store*/) { return std::nullopt; })},
+    {"firstImport", nullptr, withStore(importRandomHomes)},
+    {"import", beginWithHome, withStore(importRandomHomes)},
+    {"merge", beginWithHome, withStore(mergeRandomHome)},
+    {"write", beginWithHome, withStore(writeTwoValues)},
+    {"scene", beginWithHome, runScene},
+    {"migration", beginWithHome, migrate, migratedContents},
+};
+
+/// One change, made in folders of its own with one fault after the other.
+class StoreFaultTest : public testing::TestWithParam<Change> {
+ protected:
+  StoreFaultTest() {
+    const TestFolder folder;
+    begin(folder);
+    before_ = GetParam().contents(folder.path());
+  }
+
+  /// What the change leads to without faults.
+  void makeWithoutFaults() {
+    const TestFolder folder;
+    begin(folder);
+    ASSERT_TRUE(GetParam().make(folder.path()));
+    after_ = GetParam().contents(folder.path());
+  }
+
+  /// Makes the change with `arm` before and `disarm` after it; false once no fault was met.
+  bool isMetByFault(const std::function<void()>& arm, const std::function<bool()>& disarm) {
+    const TestFolder folder;
+    begin(folder);
+    arm();
+    const bool isDone = GetParam().make(folder.path());
+    const bool wasMet = disarm();
+    EXPECT_EQ(integrityOf(folder.path()), "ok");
+    const std::string contents = GetParam().contents(folder.path());
+    EXPECT_TRUE(contents == after_ || (!isDone && contents == before_)) << contents;
+    EXPECT_TRUE(isDone || wasMet);
+    return wasMet;
+  }
+
+ private:
+  static void begin(const TestFolder& folder) {
+    if (GetParam().begin) GetParam().begin(folder.path());
+  }
+
+  std::string before_;
+  std::string after_;
+};
+
+/// Tries fault number `first`, then each `stride`th after it, until one is not met; gives how many
+/// were. More than there are calls in any change is an endless loop.
+std::int64_t countFaults(std::int64_t stride, const std::function<bool(std::int64_t)>& isMet) {
+  constexpr std::int64_t kMostFaults = 100'000;
+  std::int64_t faults = 0;
+  std::int64_t number = 1;
+  while (number < kMostFaults && !testing::Test::HasFailure() && isMet(number)) {
+    number += stride;
+    ++faults;
+  }
+  EXPECT_GT(faults, 0);
+  EXPECT_LT(number, kMostFaults);
+  return faults;
+}
+
+/// Lets every call to the disk fail in turn, once and for ever, while `isMet` does its work between
+/// the two functions it is given.
+using Attempt =
+    std::function<bool(const std::function<void()>& arm, const std::function<bool()>& disarm)>;
+
+void failDisk(FaultyDisk::Kind kind, const Attempt& isMet) {
+  FaultyDisk disk;
+  std::int64_t faults = 0;
+  for (const bool lasts : {false, true}) {
+    faults += countFaults(1, [&](std::int64_t number) {
+      return isMet([&] { disk.arm({kind, number, lasts}); }, [&] { return disk.disarm(); });
+    });
+  }
+  testing::Test::RecordProperty("faults", std::to_string(faults));
+}
+
+/// The same for memory. There are many allocations: all of them fail in the long form alone, the
+/// short one tries some of them.
+void failMemory(const Attempt& isMet) {
+  constexpr std::int64_t kShortStride = 23;
+  const std::int64_t stride = std::getenv("NIDUS_EVERY_FAULT") ? 1 : kShortStride;
+  FaultyMemory memory;
+  const FaultyDisk fasterDisk;
+  std::int64_t faults = 0;
+  for (const bool lasts : {false, true}) {
+    faults += countFaults(stride, [&](std::int64_t number) {
+      return isMet([&] { memory.arm({number, lasts}); }, [&] { return memory.disarm(); });
+    });
+  }
+  testing::Test::RecordProperty("faults", std::to_string(faults));
+}
+
+TEST_P(StoreFaultTest, SurvivesEachFailingCall) {
+  makeWithoutFaults();
+  failDisk(FaultyDisk::Kind::error,
+           [this](const auto& arm, const auto& disarm) { return isMetByFault(arm, disarm); });
+}
+
+TEST_P(StoreFaultTest, SurvivesEachShortStep) {
+  makeWithoutFaults();
+  failDisk(FaultyDisk::Kind::shortStep,
+           [this](const auto& arm, const auto& disarm) { return isMetByFault(arm, disarm); });
+}
+
+TEST_P(StoreFaultTest, SurvivesAFullDisk) {
+  makeWithoutFaults();
+  failDisk(FaultyDisk::Kind::full,
+           [this](const auto& arm, const auto& disarm) { return isMetByFault(arm, disarm); });
+}
+
+TEST_P(StoreFaultTest, SurvivesFailingAllocations) {
+  makeWithoutFaults();
+  failMemory([this](const auto& arm, const auto& disarm) { return isMetByFault(arm, disarm); });
+}
+
+INSTANTIATE_TEST_SUITE_P(Changes, StoreFaultTest, testing::ValuesIn(kChanges),
+                         [](const auto& instance) { return std::string(instance.param.name); });
+
+/// Reads a database with faults and expects what it holds or a failure.
+class StoreReadFaultTest : public testing::Test {
+ protected:
+  StoreReadFaultTest() { beginWithHome(folder_.path()); }
+
+  bool isMetByFault(const std::function<void()>& arm, const std::function<bool()>& disarm) {
+    arm();
+    const auto store = HomeStore::open(databaseIn(folder_.path()), kNoWaiting);
+    const auto homes = store ? (*store)->loadHomes() : store.failure();
+    const bool wasMet = disarm();
+    EXPECT_EQ(homes ? documentOf(*homes) : expected_, expected_);
+    return wasMet;
+  }
+
+ private:
+  const TestFolder folder_;
+  const std::string expected_ = documentOf({homeWithScene(), RandomHome(1).home()});
+};
+
+TEST_F(StoreReadFaultTest, FailsOrIsRightOnADisk) {
+  failDisk(FaultyDisk::Kind::error,
+           [this](const auto& arm, const auto& disarm) { return isMetByFault(arm, disarm); });
+}
+
+TEST_F(StoreReadFaultTest, FailsOrIsRightWithoutMemory) {
+  failMemory([this](const auto& arm, const auto& disarm) { return isMetByFault(arm, disarm); });
+}
+
+/// A store that has met a fault and lives on.
+TEST(StoreAfterFaultTest, WritesAgain) {
+  const TestFolder folder;
+  beginWithHome(folder.path());
+  FaultyDisk disk;
+  const auto store = HomeStore::open(databaseIn(folder.path()), kNoWaiting);
+  for (std::int64_t number = 1;; ++number) {
+    disk.arm({FaultyDisk::Kind::error, number, false});
+    static_cast<void>(importRandomHomes(**store));
+    if (!disk.disarm()) break;
+    const Status failure = (*store)->replaceHomes({homeWithScene()});
+    ASSERT_FALSE(failure) << failure->message;
+    ASSERT_EQ(homesIn(folder.path()), documentOf({homeWithScene()}));
+  }
+}
+
+}  // namespace
+}  // namespace nidus
