@@ -21,7 +21,7 @@ Result<TemporaryFolder> TemporaryFolder::make() {
 
 TemporaryFolder::~TemporaryFolder() {
   std::error_code ignored;
-  if (!path_.empty()) std::filesystem::remove_all(path_, ignored);
+  if (!path_.empty() && !isKept_) std::filesystem::remove_all(path_, ignored);
 }
 
 }  // namespace nidus

@@ -29,6 +29,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"home", "move", "service"}, {"--to-group", "--from-group", "ACCESSORY/NAME"}},
       {{"home", "remove"}, {"--yes", "scene", "Examples"}},
       {{"home", "remove", "room"}, {"NAME", "--home", "--yes", "Exit status"}},
+      {{"home", "edit"}, {"EDITOR", "VISUAL", "--yes", "Examples", "Exit status"}},
       {{"perform"}, {"FILE", "standard input", "Exit status", "\"filter\""}},
       {{"sync"}, {"reset"}},
       {{"records"}, {"record a line"}},

@@ -1,23 +1,12 @@
-#include <bit>
 #include <cstdint>
 #include <ostream>
 
 #include "HomePlatform/Json/JsonWriter.h"
 #include "HomePlatform/Store/HomeDocument.h"
+#include "HomePlatform/Store/ValueConversion.h"
 
 namespace nidus {
 namespace {
-
-/// Equal so that a reader could not tell the two apart: of one kind, floats bit by bit.
-bool isSame(const NDValueRef& a, const NDValueRef& b) {
-  if (a == b) return true;
-  if (!a || !b || a->isBoolean() != b->isBoolean() || a->isFloating() != b->isFloating()) {
-    return false;
-  }
-  if (!a->isFloating()) return a->isEqual(*b);
-  return std::bit_cast<std::uint32_t>(a->floatValue()) ==
-         std::bit_cast<std::uint32_t>(b->floatValue());
-}
 
 /// Writes the parts of a document; what has its default is left out.
 class DocumentWriter {
@@ -121,7 +110,7 @@ class DocumentWriter {
     writeText("characteristicType", characteristic.characteristicType);
     writeProperties(characteristic.properties);
     writeValue("value", characteristic.value);
-    if (!isSame(characteristic.value, characteristic.deviceValue)) {
+    if (!isSameValue(characteristic.value, characteristic.deviceValue)) {
       writeValue("deviceValue", characteristic.deviceValue);
     }
     if (characteristic.metadata) {

@@ -1,6 +1,7 @@
 #include "HomePlatform/Store/ValueConversion.h"
 
 #include <array>
+#include <bit>
 #include <cmath>
 #include <cstdint>
 #include <limits>
@@ -64,6 +65,16 @@ NDValueRef convertToFormat(const NDValueRef& value, const NDString& format) {
   if (integers) return toInteger(value, *integers);
   if (isBoolean) return value->isBoolean() ? value : NDValue::boolean(value->boolValue());
   return value->isFloating() ? value : NDValue::floating(value->floatValue());
+}
+
+bool isSameValue(const NDValueRef& a, const NDValueRef& b) {
+  if (a == b) return true;
+  if (!a || !b || a->isBoolean() != b->isBoolean() || a->isFloating() != b->isFloating()) {
+    return false;
+  }
+  if (!a->isFloating()) return a->isEqual(*b);
+  return std::bit_cast<std::uint32_t>(a->floatValue()) ==
+         std::bit_cast<std::uint32_t>(b->floatValue());
 }
 
 }  // namespace nidus

@@ -11,4 +11,8 @@ namespace nidus {
 /// Gives null when the value is null or does not fit; the same object when nothing changes.
 [[nodiscard]] NDValueRef convertToFormat(const NDValueRef& value, const NDString& format);
 
+/// Whether a reader of a document could not tell two values, which may be null, apart: they are of
+/// one kind and equal, floats bit by bit.
+[[nodiscard]] bool isSameValue(const NDValueRef& a, const NDValueRef& b);
+
 }  // namespace nidus

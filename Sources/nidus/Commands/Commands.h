@@ -15,6 +15,7 @@ void declareHomeCheck(CommandSyntax& home);
 void declareHomeRename(CommandSyntax& home, Workspace& workspace);
 void declareHomeMove(CommandSyntax& home, Workspace& workspace);
 void declareHomeRemove(CommandSyntax& home, Workspace& workspace);
+void declareHomeEdit(CommandSyntax& home, Workspace& workspace);
 void declarePerform(CommandSyntax& program, Workspace& workspace);
 void declareSync(CommandSyntax& program, Workspace& workspace);
 void declareRecords(CommandSyntax& program, Workspace& workspace);

@@ -12,6 +12,7 @@ void declareHome(CommandSyntax& program, Workspace& workspace) {
   declareHomeRename(home, workspace);
   declareHomeMove(home, workspace);
   declareHomeRemove(home, workspace);
+  declareHomeEdit(home, workspace);
 }
 
 }  // namespace nidus

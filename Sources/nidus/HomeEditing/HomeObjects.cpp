@@ -1,11 +1,13 @@
 #include "nidus/HomeEditing/HomeObjects.h"
 
 #include <algorithm>
+#include <iterator>
 #include <numeric>
 #include <string_view>
 #include <utility>
 
 #include "PlatformModel/System/NDTextMatching.h"
+#include "nidus/Orders/NearMiss.h"
 
 namespace nidus {
 namespace {
@@ -165,21 +167,34 @@ Failure ambiguity(const std::vector<HomeData>& homes, const ObjectWords& words,
                   (words.kind == ObjectKind::home ? "" : ", or its home with --home"));
 }
 
-Failure absence(const ObjectWords& words) {
+Failure absence(const std::vector<HomeData>& homes, const ObjectWords& words,
+                const std::vector<ObjectPlace>& sought) {
+  std::vector<std::string> spellings;
+  spellings.reserve(2 * sought.size());
+  for (const ObjectPlace& place : sought) {
+    spellings.push_back(nameAt(homes, words.kind, place).str());
+    spellings.push_back(spellingAt(homes, words.kind, place));
+  }
+  const std::vector<std::string_view> known(spellings.begin(), spellings.end());
+  const std::string_view meant = nearMiss(words.name, known);
   return badInput("there is no " + wordOf(words.kind) + ' ' + words.name +
-                  "; nidus home show lists what there is");
+                  (meant.empty() ? "; nidus home show lists what there is"
+                                 : "; did you mean " + std::string(meant) + '?'));
 }
 
 Result<ObjectPlace> findAmong(const std::vector<HomeData>& homes,
                               const std::vector<std::size_t>& range, const ObjectWords& words) {
-  std::vector<ObjectPlace> found;
+  std::vector<ObjectPlace> sought;
   for (const std::size_t home : range) {
-    for (const ObjectPlace& place : placesIn(homes, home, words.kind)) {
-      if (isNamedAt(homes, words.kind, place, words.name)) found.push_back(place);
-    }
+    const auto places = placesIn(homes, home, words.kind);
+    sought.insert(sought.end(), places.begin(), places.end());
   }
+  std::vector<ObjectPlace> found;
+  std::copy_if(
+      sought.begin(), sought.end(), std::back_inserter(found),
+      [&](const ObjectPlace& place) { return isNamedAt(homes, words.kind, place, words.name); });
   if (found.size() == 1) return found.front();
-  return found.empty() ? absence(words) : ambiguity(homes, words, found);
+  return found.empty() ? absence(homes, words, sought) : ambiguity(homes, words, found);
 }
 
 }  // namespace

@@ -110,6 +110,17 @@ TEST(ConvertToFormatTest, KeepsTheSameObject) {
   EXPECT_EQ(convertToFormat(value, nullptr), value);
 }
 
+TEST(IsSameValueTest, TellsKindsAndBitsApart) {
+  const NDValueRef values[] = {nullptr,        NDValue::boolean(true), integer(1),
+                               floating(1.0F), floating(0.0F),         floating(-0.0F),
+                               integer(2),     NDValue::text("1"),     NDValue::text("")};
+  for (const NDValueRef& a : values) {
+    for (const NDValueRef& b : values) EXPECT_EQ(isSameValue(a, b), &a == &b);
+  }
+  EXPECT_TRUE(isSameValue(NDValue::text("1"), NDValue::text("1")));
+  EXPECT_TRUE(isSameValue(floating(std::nanf("")), floating(std::nanf(""))));
+}
+
 TEST(ConvertToFormatTest, GivesNullForNull) {
   for (const char* format : {"bool", "int", "float", "string", "other"}) {
     EXPECT_FALSE(convertToFormat(nullptr, format));

@@ -78,6 +78,16 @@ TEST(FindObjectTest, RefusesWhatIsNotThere) {
               IsBadInput("there is no service Floor lamp/12"));
 }
 
+TEST(FindObjectTest, SuggestsANearMiss) {
+  const auto homes = sampleHomes();
+  EXPECT_THAT(findObject(homes, {ObjectKind::room, "Kichen", ""}),
+              IsBadInput("there is no room Kichen; did you mean Kitchen?"));
+  EXPECT_THAT(findObject(homes, {ObjectKind::home, "Beach Hose", ""}),
+              IsBadInput("did you mean Beach House?"));
+  EXPECT_THAT(findObject(homes, {ObjectKind::service, "Flor lamp/Lamp", ""}),
+              IsBadInput("did you mean Floor lamp/Lamp?"));
+}
+
 TEST(FindHomeTest, TakesTheOnlyOne) {
   auto homes = sampleHomes();
   EXPECT_THAT(findHome(homes, ""), IsBadInput("there are 2 homes; say which with --home"));
