@@ -88,6 +88,7 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   declareSync(program, workspace);
   declareRecords(program, workspace);
   declareVocabulary(program, workspace);
+  declarePreferences(program, workspace);
   declareReplay(program);
   declareDemo(program);
   declareDoctor(program, workspace);

@@ -8,6 +8,7 @@
 
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/System/NDTextMatching.h"
+#include "nidus/Terminal/TextTable.h"
 
 namespace nidus {
 namespace {
@@ -80,33 +81,19 @@ std::string paragraph(const Words& words) {
   return text + line + '\n';
 }
 
-std::string padded(std::string text, std::size_t width) {
-  text.resize(std::max(width, text.size()), ' ');
-  return text;
-}
-
-std::string attributeTable(const std::vector<CharacteristicEntry>& entries) {
-  constexpr std::size_t kColumns = 4;
-  std::vector<std::array<std::string, kColumns>> rows = {{"ATTRIBUTE", "USE", "VALUE", "UNIT"}};
+std::string attributeTable(const std::vector<CharacteristicEntry>& entries,
+                           const TerminalStyle& style) {
+  TextTable table({"ATTRIBUTE", "USE", "VALUE", "UNIT"});
   for (const CharacteristicEntry& entry : entries) {
-    rows.push_back({entry.assistantName.str(), useOf(entry), valuesOf(entry), unitOf(entry)});
+    table.addRow({entry.assistantName.str(), useOf(entry), valuesOf(entry), unitOf(entry)});
   }
-  std::array<std::size_t, kColumns> widths{};
-  for (const auto& row : rows) {
-    for (std::size_t i = 0; i < kColumns; ++i)
-      widths.at(i) = std::max(widths.at(i), row.at(i).size());
-  }
-  std::string text;
-  for (const auto& row : rows) {
-    std::string line;
-    for (std::size_t i = 0; i < kColumns; ++i) line += "  " + padded(row.at(i), widths.at(i));
-    text += line.erase(line.find_last_not_of(' ') + 1) + '\n';
-  }
-  return text;
+  return table.text(style);
 }
 
 void addLine(std::string& text, const std::string& title, const std::string& content) {
-  if (!content.empty()) text += "  " + padded(title, 15) + content + '\n';
+  constexpr std::size_t kTitleWidth = 15;
+  if (content.empty()) return;
+  text += "  " + title + std::string(kTitleWidth - title.size(), ' ') + content + '\n';
 }
 
 std::string detailsOf(const CharacteristicEntry& entry) {
@@ -181,9 +168,20 @@ Vocabulary entriesMatching(const Vocabulary& vocabulary, std::string_view word) 
   return selection(vocabulary, [word](const auto& entry) { return containsWord(entry, word); });
 }
 
-std::string vocabularyText(const Vocabulary& vocabulary) {
+std::vector<std::string_view> wordsOf(const Vocabulary& vocabulary) {
+  std::vector<std::string_view> words;
+  const auto add = [&words](const auto& entries) {
+    for (const auto& entry : entries) words.push_back(entry.assistantName.view());
+  };
+  add(vocabulary.characteristics);
+  add(vocabulary.services);
+  add(vocabulary.units);
+  return words;
+}
+
+std::string vocabularyText(const Vocabulary& vocabulary, const TerminalStyle& style) {
   return "Attributes; numbers can be raised and lowered, what is on or off can be toggled:\n" +
-         attributeTable(vocabulary.characteristics) + "\nService types, for --type:\n" +
+         attributeTable(vocabulary.characteristics, style) + "\nService types, for --type:\n" +
          paragraph(namesOf(vocabulary.services)) + "\nEntity types, for --entity:\n" +
          paragraph(Words(kEntityTypes.begin(), kEntityTypes.end())) +
          "\nUnits, for a value in a JSON command:\n" + paragraph(namesOf(vocabulary.units)) +

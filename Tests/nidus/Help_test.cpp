@@ -14,8 +14,8 @@ struct HelpCase {
 TEST_F(ProgramTest, HelpsOnEachLevel) {
   const HelpCase table[] = {
       {{},
-       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo", "doctor",
-        "Exit status"}},
+       {"--data", "--locked", "--version", "home", "perform", "sync", "records", "replay", "demo",
+        "doctor", "Exit status"}},
       {{"home"}, {"import", "export", "show", "check", "--data"}},
       {{"home", "import"}, {"FILE", "--merge", "--data"}},
       {{"home", "export"}, {"FILE"}},
@@ -34,6 +34,8 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"sync"}, {"reset"}},
       {{"records"}, {"record a line"}},
       {{"vocabulary"}, {"WORD", "--json", "Exit status"}},
+      {{"preferences"}, {"list", "get", "set", "unset", "preferences.json"}},
+      {{"preferences", "set"}, {"KEY", "VALUE", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
       {{"completion"}, {"bash, zsh or fish", "Exit status"}},
       {{"demo"}, {"temporary folder"}},

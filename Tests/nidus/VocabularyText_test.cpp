@@ -21,7 +21,7 @@ std::string lineWith(const std::string& text, const std::string& word) {
 }
 
 TEST(VocabularyTextTest, TellsUseValueAndUnit) {
-  const std::string text = vocabularyText(builtInVocabulary());
+  const std::string text = vocabularyText(builtInVocabulary(), {});
   EXPECT_THAT(
       lineWith(text, "BRIGHTNESS"),
       AllOf(HasSubstr("read and set"), HasSubstr("a whole number"), HasSubstr("percentage")));
@@ -30,11 +30,11 @@ TEST(VocabularyTextTest, TellsUseValueAndUnit) {
   EXPECT_THAT(lineWith(text, "IDENTIFY"), HasSubstr("  set "));
   EXPECT_THAT(lineWith(text, "MOTION "), AllOf(HasSubstr("  read "), HasSubstr("on, off")));
   EXPECT_THAT(lineWith(text, "ENABLED "), HasSubstr("runs a scene"));
-  EXPECT_THAT(lineWith(text, "  TEMPERATURE "), HasSubstr("celsius (by locale)"));
+  EXPECT_THAT(lineWith(text, "HEATING_THRESHOLD "), HasSubstr("celsius (by locale)"));
 }
 
 TEST(VocabularyTextTest, ListsTypesAndUnits) {
-  const std::string text = vocabularyText(builtInVocabulary());
+  const std::string text = vocabularyText(builtInVocabulary(), {});
   EXPECT_THAT(text, HasSubstr("  LIGHT, SWITCH,"));
   EXPECT_THAT(text, HasSubstr("  HOME, ROOM, ZONE, SERVICE, GROUP, SCENE, TRIGGER\n"));
   EXPECT_THAT(text, HasSubstr("  CELSIUS, FAHRENHEIT,"));
@@ -46,7 +46,7 @@ TEST(VocabularyTextTest, DescribesWordsOfTheUser) {
               {"assistantName": "BLOB", "valueType": "data"}]})",
                                    "mine.json");
   ASSERT_TRUE(own);
-  const std::string text = vocabularyText(*own);
+  const std::string text = vocabularyText(*own, {});
   EXPECT_THAT(lineWith(text, "LABEL"), HasSubstr("a text"));
   EXPECT_THAT(lineWith(text, "BLOB"), AllOf(HasSubstr("neither read nor set"), HasSubstr("data")));
 }

@@ -48,7 +48,12 @@ TEST_F(VocabularyTest, RefusesAWordThatThereIsNot) {
   const ProgramEnd end = run({"vocabulary", "xyzzy", "--json"});
   EXPECT_EQ(end.exitStatus, 2);
   EXPECT_THAT(end.output, IsEmpty());
-  EXPECT_THAT(end.errors, IsOneFailure("no word of the vocabulary contains \"xyzzy\""));
+  EXPECT_THAT(end.errors, IsOneFailure("xyzzy: no word of the vocabulary contains this"));
+}
+
+TEST_F(VocabularyTest, SuggestsANearMiss) {
+  EXPECT_THAT(run({"vocabulary", "brigtness"}).errors, HasSubstr("did you mean BRIGHTNESS?"));
+  EXPECT_THAT(run({"vocabulary", "thermosat"}).errors, HasSubstr("did you mean THERMOSTAT?"));
 }
 
 }  // namespace

@@ -20,6 +20,7 @@ void declarePerform(CommandSyntax& program, Workspace& workspace);
 void declareSync(CommandSyntax& program, Workspace& workspace);
 void declareRecords(CommandSyntax& program, Workspace& workspace);
 void declareVocabulary(CommandSyntax& program, Workspace& workspace);
+void declarePreferences(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
 void declareDoctor(CommandSyntax& program, Workspace& workspace);

@@ -4,6 +4,7 @@
 #include "HomePlatform/Metadata/VocabularyWriter.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Orders/WordChoice.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/VocabularyText.h"
 #include "nidus/Workspace.h"
@@ -27,12 +28,12 @@ ExitStatus showVocabulary(const VocabularyOptions& options, Workspace& workspace
   if (!session) return report(session.failure());
   const Vocabulary& all = (*session)->platform().vocabulary();
   if (options.word.empty()) {
-    return printText(options.isJson ? documentOf(all) : vocabularyText(all));
+    return printText(options.isJson ? documentOf(all) : vocabularyText(all, standardOutputStyle()));
   }
   const Vocabulary matching = entriesMatching(all, options.word);
   if (matching.isEmpty()) {
-    return report({Failure::Kind::badInput, "no word of the vocabulary contains \"" + options.word +
-                                                "\"; see nidus vocabulary"});
+    return report(unknownWord(options.word, wordsOf(all),
+                              "no word of the vocabulary contains this; see nidus vocabulary"));
   }
   return printText(options.isJson ? documentOf(matching) : vocabularyDetails(matching));
 }

@@ -1,51 +1,26 @@
-#include <array>
-#include <string_view>
+#include <string>
 
-#include "HomePlatform/System/DeviceInformation.h"
 #include "HomePlatform/System/Preferences.h"
 #include "nidus/Doctor/Checks.h"
 #include "nidus/Doctor/Remedy.h"
+#include "nidus/Preferences/PreferenceKeys.h"
 
 namespace nidus {
 namespace {
 
-enum class Type { boolean, integer };
-
-struct KnownKey {
-  std::string_view key;
-  Type type;
-};
-
-constexpr std::array kKnownKeys = {KnownKey{Preferences::kHomesConfigured, Type::boolean},
-                                   KnownKey{"NidusLogLevel", Type::integer},
-                                   KnownKey{"NidusDeveloperLogLevel", Type::integer},
-                                   KnownKey{DeviceInformation::kInternalBuild, Type::boolean}};
-
-const KnownKey* knownKey(std::string_view name) {
-  for (const KnownKey& known : kKnownKeys) {
-    if (known.key == name) return &known;
-  }
-  return nullptr;
-}
-
-bool isOf(Type type, const JsonValue& value) {
-  return type == Type::boolean ? std::holds_alternative<bool>(value.content)
-                               : std::holds_alternative<std::int64_t>(value.content);
-}
-
 void checkMember(const JsonValue::Member& member, const std::string& file, Findings& findings) {
   const std::string place = file + ": " + member.first;
   const std::string key = shellWord(member.first);
-  const KnownKey* known = knownKey(member.first);
+  const PreferenceKey* known = findPreferenceKey(member.first);
   if (!known) {
     findings.push_back({Severity::note, place, "nothing uses it",
                         "remove it with nidus preferences unset " + key});
-  } else if (!isOf(known->type, member.second)) {
-    const bool isBoolean = known->type == Type::boolean;
+  } else if (!isValidPreference(*known, member.second)) {
+    const bool isFlag = known->kind == PreferenceKey::Kind::flag;
     findings.push_back({Severity::attention, place,
-                        std::string("it is no ") + (isBoolean ? "true or false" : "whole number") +
+                        std::string("it is no ") + (isFlag ? "true or false" : "whole number") +
                             ", so it counts as missing",
-                        "nidus preferences set " + key + (isBoolean ? " true" : " 5")});
+                        "nidus preferences set " + key + (isFlag ? " true" : " 5")});
   }
 }
 
