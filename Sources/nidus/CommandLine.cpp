@@ -84,6 +84,7 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   program.candidates("--data", {{CandidateKind::files}});
   program.flag("--locked", workspace.settings().isLocked, "The device is locked");
   declareHome(program, workspace);
+  declareOrders(program, workspace);
   declarePerform(program, workspace);
   declareSync(program, workspace);
   declareRecords(program, workspace);

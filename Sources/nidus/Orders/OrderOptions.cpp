@@ -15,6 +15,14 @@ void declareFilterOptions(CommandSyntax& syntax, OrderFilter& filter) {
   syntax.option("--entity", "KIND", filter.entity,
                 "Objects of this kind: home, room, zone, group, service, scene or trigger; else "
                 "services");
+  syntax.candidates("--home", {{CandidateKind::homes}});
+  syntax.candidates("--room", {{CandidateKind::rooms}});
+  syntax.candidates("--zone", {{CandidateKind::zones}});
+  syntax.candidates("--group", {{CandidateKind::groups}});
+  syntax.candidates("--service", {{CandidateKind::services}});
+  syntax.candidates("--scene", {{CandidateKind::scenes}});
+  syntax.candidates("--type", {{CandidateKind::serviceTypes}});
+  syntax.candidates("--entity", {{CandidateKind::entityTypes}});
 }
 
 }  // namespace nidus

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "nidus/Orders/LimitSearch.h"
 #include "nidus/Outcome.h"
 
 namespace nidus {
@@ -10,7 +11,12 @@ namespace nidus {
 Result<Order> readOrderFor(Session& session, const OrderWords& words) {
   HomePlatform& platform = session.platform();
   const bool isMetric = platform.locale()->usesMetricSystem().value_or(false);
-  return readOrder(words, platform.vocabulary(), isMetric);
+  const Vocabulary& vocabulary = platform.vocabulary();
+  auto order = readOrder(words, vocabulary, isMetric);
+  if (!order) return order;
+  if (auto failure = session.openModule()) return *failure;
+  const OrderValueReader values(vocabulary, isMetric);
+  return withLimitValues(std::move(*order), vocabulary, values, session.runner());
 }
 
 Result<std::vector<Replies>> performOrder(Session& session, const Order& order) {

@@ -103,6 +103,11 @@ Result<VAHAValueRef> OrderValueReader::read(const std::string& text,
                  text + ": " + entry.assistantName.str() + " takes " + expectationOf(entry)};
 }
 
+VAHAValueRef OrderValueReader::ofLimit(const NDValueRef& number,
+                                       const CharacteristicEntry& entry) const {
+  return numberValue(number, isTemperature(entry) ? assistantUnit(entry.unit) : nullptr);
+}
+
 VAHAValueRef OrderValueReader::readNumber(const std::string& text, const CharacteristicEntry& entry,
                                           ValueUse use) const {
   const auto quantity = readQuantity(text, vocabulary_);

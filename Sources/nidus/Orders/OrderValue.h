@@ -25,6 +25,11 @@ class OrderValueReader {
   [[nodiscard]] Result<VAHAValueRef> read(const std::string& text, const CharacteristicEntry& entry,
                                           ValueUse use) const;
 
+  /// The value that sets to a limit, which is in the attribute's own unit. `number`, never null,
+  /// is of the attribute's value type.
+  [[nodiscard]] VAHAValueRef ofLimit(const NDValueRef& number,
+                                     const CharacteristicEntry& entry) const;
+
  private:
   [[nodiscard]] VAHAValueRef readNumber(const std::string& text, const CharacteristicEntry& entry,
                                         ValueUse use) const;
