@@ -1,6 +1,7 @@
 #include <sys/stat.h>
 
 #include "nidus/ProgramTest.h"
+#include "nidus/TerminalProcess.h"
 
 namespace nidus {
 namespace {
@@ -99,6 +100,36 @@ TEST_F(DoctorTest, TellsProgramsTheSame) {
   const ProgramEnd ill = run({"doctor", "--json"});
   EXPECT_EQ(ill.exitStatus, 1);
   EXPECT_THAT(ill.output, HasSubstr(R"([{"area": "preferences", "severity": "attention", )"));
+}
+
+TEST_F(DoctorTest, IsHonestAboutTheDemonstrationHome) {
+  ASSERT_EQ(run({"home", "import", NIDUS_RESOURCES "/demonstration-home.json"}).exitStatus, 0);
+  EXPECT_THAT(report(),
+              AllOf(HasSubstr("Maple House / Kitchen and Lake Cabin / Kitchen share their name"),
+                    HasSubstr("Terrace Lights / (no name): it has no name"),
+                    HasSubstr("Blind Bridge: the assistant cannot address it"),
+                    HasSubstr("Maple House / Downstairs: an order for this zone does not reach"),
+                    HasSubstr("Garage / Garage Light: the accessory cannot be reached"),
+                    EndsWith("\n6 things need attention, with 1 note.\n")));
+}
+
+TEST_F(DoctorTest, AdvisesCommandsThatMend) {
+  import(documentOf({smallHome()}));
+  ASSERT_THAT(report(), AllOf(HasSubstr("nidus home remove accessory Away\n"),
+                              HasSubstr("nidus home remove scene Night\n")));
+  ASSERT_EQ(run({"home", "remove", "accessory", "Away", "--yes"}).exitStatus, 0);
+  ASSERT_EQ(run({"home", "remove", "scene", "Night", "--yes"}).exitStatus, 0);
+  EXPECT_EQ(run({"doctor"}).exitStatus, 0);
+}
+
+TEST_F(DoctorTest, MarksAreasOnATerminal) {
+  const ProgramEnd well = runOnTerminal(start({"doctor"}));
+  EXPECT_EQ(well.exitStatus, 0);
+  EXPECT_THAT(well.output, AllOf(HasSubstr("✓"), HasSubstr("\x1b["), Not(HasSubstr("ok  "))));
+  folder_.write("data/preferences.json", "[]");
+  const ProgramEnd ill = runOnTerminal(start({"doctor"}));
+  EXPECT_EQ(ill.exitStatus, 1);
+  EXPECT_THAT(ill.output, HasSubstr("✗"));
 }
 
 TEST_F(DoctorTest, FailsWhereItCannotReport) {

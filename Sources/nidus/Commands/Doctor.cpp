@@ -16,7 +16,7 @@ ExitStatus examineAll(bool asJson, Workspace& workspace) {
   if (!folder) return report(folder.failure());
   const auto areas = diagnose(examine(*folder));
   const ExitStatus printed =
-      printText(asJson ? doctorJson(areas) : doctorText(areas, TerminalStyle()));
+      printText(asJson ? doctorJson(areas) : doctorText(areas, standardOutputStyle()));
   if (printed != ExitStatus::success) return printed;
   return isWell(areas) ? ExitStatus::success : ExitStatus::otherOutcome;
 }

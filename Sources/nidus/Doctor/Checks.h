@@ -21,4 +21,19 @@ void checkPreferences(const Examination& examination, Findings& findings);
 /// The homes as a whole: that there are some, that the assistant sees them, the primary one.
 void checkHomes(const Examination& examination, Findings& findings);
 
+// What follows looks at the homes, which there must be.
+
+/// Names that mean several objects, for those orders that cannot tell them apart.
+void checkNames(const Examination& examination, Findings& findings);
+/// Services that the assistant cannot address, or not in every way.
+void checkAddresses(const Examination& examination, Findings& findings);
+/// Characteristics whose metadata contradict their values, themselves or the vocabulary.
+void checkMetadata(const Examination& examination, Findings& findings);
+/// Zones without rooms, zones that take each other's rooms, rooms without accessories.
+void checkRooms(const Examination& examination, Findings& findings);
+/// Groups and scenes that lead to nothing.
+void checkTargets(const Examination& examination, Findings& findings);
+/// Accessories that cannot be reached.
+void checkAccessories(const Examination& examination, Findings& findings);
+
 }  // namespace nidus

@@ -22,6 +22,10 @@ bool mayHaveHomes(const Examination& examination) {
   return examination.homes || !examination.hasDatabase;
 }
 
+bool hasHomes(const Examination& examination) {
+  return examination.homes && !examination.homes->empty();
+}
+
 struct Check {
   const char* area;
   bool (*hasSubject)(const Examination&);  ///< Whether there is something to look at.
@@ -36,6 +40,12 @@ constexpr std::array kChecks = {
     Check{"vocabulary", always, checkVocabulary},
     Check{"preferences", always, checkPreferences},
     Check{"homes", mayHaveHomes, checkHomes},
+    Check{"names", hasHomes, checkNames},
+    Check{"services", hasHomes, checkAddresses},
+    Check{"limits and units", hasHomes, checkMetadata},
+    Check{"rooms and zones", hasHomes, checkRooms},
+    Check{"groups and scenes", hasHomes, checkTargets},
+    Check{"accessories", hasHomes, checkAccessories},
 };
 
 }  // namespace

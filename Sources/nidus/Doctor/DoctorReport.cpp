@@ -10,18 +10,19 @@
 namespace nidus {
 namespace {
 
-/// How something is marked, in colour and without.
+/// How something is marked: by a symbol in colour, and by a word without.
 struct Mark {
-  const char* coloured;
-  const char* plain;
+  const char* symbol;
+  Colour colour;
+  const char* word;
 };
 
-constexpr Mark kWell = {"\x1b[32m✓\x1b[0m ", "ok         "};
-constexpr Mark kAttention = {"\x1b[31m✗\x1b[0m ", "attention  "};
-constexpr Mark kNote = {"\x1b[33m•\x1b[0m ", "note       "};
+constexpr Mark kWell = {"✓ ", Colour::good, "ok         "};
+constexpr Mark kAttention = {"✗ ", Colour::bad, "attention  "};
+constexpr Mark kNote = {"• ", Colour::warning, "note       "};
 
-const char* textOf(const Mark& mark, const TerminalStyle& style) {
-  return style.hasColour ? mark.coloured : mark.plain;
+std::string textOf(const Mark& mark, const TerminalStyle& style) {
+  return style.hasColour ? coloured(mark.symbol, mark.colour, style) : mark.word;
 }
 
 bool isGrave(const Finding& finding) { return finding.severity == Severity::attention; }

@@ -1,6 +1,6 @@
 #include "nidus/Doctor/Remedy.h"
 
-#include <algorithm>
+#include <utility>
 
 namespace nidus {
 namespace {
@@ -30,6 +30,10 @@ std::string shellWord(std::string_view text) {
     }
   }
   return word + '\'';
+}
+
+std::string homeOption(const std::vector<HomeData>& homes, const HomeData& home) {
+  return homes.size() < 2 ? "" : " --home " + shellWord(home.name.view());
 }
 
 Finding findingOf(const Failure& failure) {
