@@ -73,7 +73,7 @@ class OrderReader {
   }
   [[nodiscard]] bool hasMore() const { return used_ < words_.words.size(); }
   [[nodiscard]] Status refuseMore() const;
-  [[nodiscard]] Failure wrongVerb(const std::string& remedy) const;
+  [[nodiscard]] Failure impossible(const std::string& reason) const;
   void add(std::string_view type, VAHAValueRef value = nullptr) {
     order_.commands.push_back(commandOf(filter_, order_, type, std::move(value)));
   }
@@ -141,8 +141,8 @@ Status OrderReader::refuseMore() const {
   return badInput(rest() + ": nothing is expected after " + words_.verb + ' ' + order_.attribute);
 }
 
-Failure OrderReader::wrongVerb(const std::string& remedy) const {
-  return badInput(order_.attribute + ": " + words_.verb + " does not suit it; " + remedy);
+Failure OrderReader::impossible(const std::string& reason) const {
+  return badInput(words_.verb + ' ' + order_.attribute + ": " + reason);
 }
 
 Status OrderReader::addWithValue(std::string_view type, const std::string& text, ValueUse use) {
@@ -156,6 +156,9 @@ Status OrderReader::readGet() {
   order_.kind = Order::Kind::get;
   if (!words_.words.empty()) {
     if (auto failure = readAttribute()) return failure;
+    if (!entry_->read && !words_.asksTarget) return impossible("it can only be set");
+    if (!entry_->write && words_.asksTarget)
+      return impossible("it is never set; ask without --target");
   }
   if (hasMore()) return readQuestion();
   add(words_.asksTarget ? VAHAActionTypeGET_TARGET_VALUEValue : VAHAActionTypeGETValue);
@@ -179,6 +182,8 @@ Status OrderReader::readQuestion() {
 Status OrderReader::readSet() {
   order_.kind = Order::Kind::set;
   if (auto failure = readAttribute()) return failure;
+  const bool isForScenes = order_.attribute == VAHAAttributeENABLEDValue;
+  if (!entry_->write && !isForScenes) return impossible("it can only be read; use nidus get");
   if (!hasMore()) return badInput("set " + order_.attribute + ": name the value");
   const std::string word = vocabularyWord(rest());
   if (isNumeric(*entry_) && (word == "MINIMUM" || word == "MIN")) {
@@ -196,7 +201,7 @@ Status OrderReader::readRelative(Order::Kind kind, std::string_view type) {
   if (auto failure = readAttribute()) return failure;
   if (entry_->valueType != NDCharacteristicMetadataFormatInt &&
       entry_->valueType != NDCharacteristicMetadataFormatFloat) {
-    return wrongVerb("use nidus set");
+    return impossible("it is no number that can be raised or lowered; use nidus set");
   }
   if (hasMore()) return addWithValue(type, rest(), ValueUse::difference);
   if (!isOwnUnitUnderstood(*entry_, isMetric_)) {
@@ -209,7 +214,9 @@ Status OrderReader::readRelative(Order::Kind kind, std::string_view type) {
 Status OrderReader::readToggle() {
   order_.kind = Order::Kind::toggle;
   if (auto failure = readAttribute()) return failure;
-  if (entry_->valueType != NDCharacteristicMetadataFormatBool) return wrongVerb("use nidus set");
+  if (entry_->valueType != NDCharacteristicMetadataFormatBool) {
+    return impossible("it is not on or off; use nidus set");
+  }
   add(VAHAActionTypeTOGGLEValue);
   return refuseMore();
 }

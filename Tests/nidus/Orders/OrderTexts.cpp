@@ -21,18 +21,29 @@ Result<Order> readLine(const std::string& line, bool isMetric) {
   return readOrder(orderWords(line), builtInVocabulary(), isMetric);
 }
 
+/// The class of a value in a word, where its description does not show it.
+std::string classOf(const VAHAValue& value) {
+  if (dynamic_cast<const VAHAFloatValue*>(&value)) return "float ";
+  if (dynamic_cast<const VAHAStringValue*>(&value)) return "text ";
+  return dynamic_cast<const VAHABooleanValue*>(&value) ? "boolean " : "";
+}
+
 std::string valueText(const VAHAValueRef& value) {
   if (!value) return "";
-  const bool isFloat = dynamic_cast<const VAHAFloatValue*>(value.get()) != nullptr;
-  const bool isText = dynamic_cast<const VAHAStringValue*>(value.get()) != nullptr;
   const std::string units = value->units() ? ' ' + value->units().str() : "";
-  const bool isBoolean = dynamic_cast<const VAHABooleanValue*>(value.get()) != nullptr;
-  return std::string(" ") +
-         (isFloat     ? "float "
-          : isText    ? "text "
-          : isBoolean ? "boolean "
-                      : "") +
-         value->description() + units;
+  return ' ' + classOf(*value) + value->description() + units;
+}
+
+std::string actionsIn(const Result<Order>& order) {
+  if (!order) return order.failure().message;
+  std::string text;
+  for (const CommandRef& command : order->commands) {
+    const VAHAAction& action = *command->actions().front();
+    text += (text.empty() ? "" : "; ") + action.actionType().str();
+    if (action.attribute()) text += ' ' + action.attribute().str();
+    text += valueText(action.value());
+  }
+  return text;
 }
 
 }  // namespace
@@ -54,16 +65,11 @@ OrderWords orderWords(const std::string& line) {
 }
 
 std::string actionsOf(const std::string& line, bool isMetric) {
-  const auto order = readLine(line, isMetric);
-  if (!order) return order.failure().message;
-  std::string text;
-  for (const CommandRef& command : order->commands) {
-    const VAHAAction& action = *command->actions().front();
-    text += (text.empty() ? "" : "; ") + action.actionType().str();
-    if (action.attribute()) text += ' ' + action.attribute().str();
-    text += valueText(action.value());
-  }
-  return text;
+  return actionsIn(readLine(line, isMetric));
+}
+
+std::string actionsOf(const std::string& line, const Vocabulary& vocabulary) {
+  return actionsIn(readOrder(orderWords(line), vocabulary, true));
 }
 
 std::string filterOf(const std::string& line) {
