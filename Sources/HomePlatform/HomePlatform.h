@@ -15,6 +15,7 @@
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
 #include "HomePlatform/Store/HomeEdit.h"
+#include "HomePlatform/Store/StoreProgress.h"
 #include "PlatformModel/NDPlatform.h"
 
 namespace nidus {
@@ -68,7 +69,9 @@ class HomePlatform : public NDPlatform {
 
   /// Puts `homes` into the database: in place of all (or, with `merge`, of those of the same UUID)
   /// in one transaction; afterwards sets "kHomesConfigured" to whether there are homes.
-  [[nodiscard]] virtual Status importHomes(const std::vector<HomeData>& homes, bool merge) = 0;
+  /// `progress` may be empty.
+  [[nodiscard]] virtual Status importHomes(const std::vector<HomeData>& homes, bool merge,
+                                           const StoreProgress& progress = nullptr) = 0;
   /// Lets `edit` change the homes as the database has them, in one transaction: no value that
   /// anybody writes meanwhile is lost. Checks and keeps what it leaves, and sets "kHomesConfigured"
   /// as an import does; after a failure all is as it was. `edit` must be quick and must not call

@@ -98,9 +98,11 @@ std::shared_ptr<NDNotificationCenter> LocalHomePlatform::notificationCenter() {
   return notifications_;
 }
 
-Status LocalHomePlatform::importHomes(const std::vector<HomeData>& homes, bool merge) {
-  return changeHomes(
-      [&] { return merge ? store_->mergeHomes(homes) : store_->replaceHomes(homes); });
+Status LocalHomePlatform::importHomes(const std::vector<HomeData>& homes, bool merge,
+                                      const StoreProgress& progress) {
+  return changeHomes([&] {
+    return merge ? store_->mergeHomes(homes, progress) : store_->replaceHomes(homes, progress);
+  });
 }
 
 Status LocalHomePlatform::editHomes(const HomeEdit& edit) {

@@ -48,7 +48,8 @@ class LocalHomePlatform final : public HomePlatform {
   [[nodiscard]] std::shared_ptr<NDQueue> sharedQueue() override { return queues_->shared(); }
   [[nodiscard]] std::shared_ptr<NDClock> clock() override { return queues_->clock(); }
 
-  [[nodiscard]] Status importHomes(const std::vector<HomeData>& homes, bool merge) override;
+  [[nodiscard]] Status importHomes(const std::vector<HomeData>& homes, bool merge,
+                                   const StoreProgress& progress) override;
   [[nodiscard]] Status editHomes(const HomeEdit& edit) override;
   [[nodiscard]] Result<std::vector<HomeData>> exportHomes() override;
   [[nodiscard]] const Vocabulary& vocabulary() const noexcept override {

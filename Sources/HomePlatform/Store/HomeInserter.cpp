@@ -1,6 +1,7 @@
 #include "HomePlatform/Store/HomeInserter.h"
 
 #include <string>
+#include <utility>
 
 namespace nidus {
 namespace {
@@ -16,6 +17,11 @@ NDString joined(const std::vector<NDString>& words) {
 }
 
 }  // namespace
+
+HomeInserter::HomeInserter(Database& database, StoreProgress progress)
+    : database_(database), progress_(std::move(progress)) {
+  if (progress_) progress_(0);
+}
 
 void HomeInserter::insert(const HomeData& home, std::int64_t position) {
   home_.run(position, home.uuid, home.name, home.primary, home.faults.read, home.faults.write);
@@ -57,6 +63,8 @@ void HomeInserter::insertAccessories(const HomeData& home) {
     const std::int64_t accessoryRow = database_.lastRow();
     accessories_[accessory.uuid] = accessoryRow;
     insertServices(accessory, accessoryRow);
+    ++storedAccessories_;
+    if (progress_) progress_(storedAccessories_);
   }
 }
 

@@ -1,10 +1,12 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <unordered_map>
 
 #include "HomePlatform/Store/Database.h"
 #include "HomePlatform/Store/HomeData.h"
+#include "HomePlatform/Store/StoreProgress.h"
 
 namespace nidus {
 
@@ -12,7 +14,8 @@ namespace nidus {
 /// transaction; what it refers to must be there, as `checkHome` makes sure. Not synchronised.
 class HomeInserter {
  public:
-  explicit HomeInserter(Database& database) : database_(database) {}
+  /// `progress` may be empty; it hears of the accessories of all homes.
+  explicit HomeInserter(Database& database, StoreProgress progress = nullptr);
 
   /// Inserts `home` with all its parts. No other home has its position or its UUID.
   void insert(const HomeData& home, std::int64_t position);
@@ -30,6 +33,8 @@ class HomeInserter {
   void insertTriggers(const HomeData& home);
 
   Database& database_;
+  const StoreProgress progress_;
+  std::size_t storedAccessories_ = 0;
   std::int64_t homeRow_ = 0;
   Rows rooms_;        ///< The rows of the present home's rooms and accessories.
   Rows accessories_;  ///< As above.

@@ -31,18 +31,18 @@ class SqliteHomeStore final : public HomeStore {
     return std::nullopt;
   }
 
-  Status replaceHomes(const std::vector<HomeData>& homes) override {
-    return change([&homes](Database& database) {
-      putInPlaceOfAll(database, homes);
+  Status replaceHomes(const std::vector<HomeData>& homes, const StoreProgress& progress) override {
+    return change([&homes, &progress](Database& database) {
+      putInPlaceOfAll(database, homes, progress);
       return Status();
     });
   }
 
-  Status mergeHomes(const std::vector<HomeData>& homes) override {
-    return change([&homes](Database& database) {
+  Status mergeHomes(const std::vector<HomeData>& homes, const StoreProgress& progress) override {
+    return change([&homes, &progress](Database& database) {
       Statement find(database, "SELECT position FROM home WHERE uuid = ?");
       Statement remove(database, "DELETE FROM home WHERE uuid = ?");
-      HomeInserter inserter(database);
+      HomeInserter inserter(database, progress);
       for (const HomeData& home : homes) {
         find.bindAll(home.uuid);
         const bool isKnown = find.step();
@@ -60,7 +60,7 @@ class SqliteHomeStore final : public HomeStore {
       std::vector<HomeData> homes = loadHomesFrom(database);
       Status failed = edit(homes);
       if (!failed) failed = checkHomes(homes, "the changed homes");
-      if (!failed) putInPlaceOfAll(database, homes);
+      if (!failed) putInPlaceOfAll(database, homes, nullptr);
       return failed;
     });
   }
@@ -118,9 +118,10 @@ class SqliteHomeStore final : public HomeStore {
       "JOIN characteristic ON characteristic.service = service.id "
       "AND characteristic.instance_id = ?4 WHERE home.uuid = ?1)";
 
-  static void putInPlaceOfAll(Database& database, const std::vector<HomeData>& homes) {
+  static void putInPlaceOfAll(Database& database, const std::vector<HomeData>& homes,
+                              const StoreProgress& progress) {
     database.run("DELETE FROM home");
-    HomeInserter inserter(database);
+    HomeInserter inserter(database, progress);
     std::int64_t position = 0;
     for (const HomeData& home : homes) inserter.insert(home, position++);
   }

@@ -11,6 +11,7 @@
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
 #include "HomePlatform/Store/HomeEdit.h"
+#include "HomePlatform/Store/StoreProgress.h"
 
 namespace nidus {
 
@@ -40,10 +41,12 @@ class HomeStore {
       std::chrono::milliseconds lockTimeout = kLockTimeout);
   virtual ~HomeStore() = default;
 
-  /// Replaces all homes. `homes` hold what a home document may hold.
-  [[nodiscard]] virtual Status replaceHomes(const std::vector<HomeData>& homes) = 0;
+  /// Replaces all homes. `homes` hold what a home document may hold. `progress` may be empty.
+  [[nodiscard]] virtual Status replaceHomes(const std::vector<HomeData>& homes,
+                                            const StoreProgress& progress = nullptr) = 0;
   /// Replaces the homes of the same UUID in their places and adds the others at the end.
-  [[nodiscard]] virtual Status mergeHomes(const std::vector<HomeData>& homes) = 0;
+  [[nodiscard]] virtual Status mergeHomes(const std::vector<HomeData>& homes,
+                                          const StoreProgress& progress = nullptr) = 0;
   /// Lets `edit`, which is not empty, change the homes as they are, and stores what it leaves if it
   /// is what a home document may hold. Nobody else writes meanwhile: `edit` must be quick and must
   /// not call the store. The failure is that of `edit`, or bad input with the place of what is

@@ -21,8 +21,12 @@ const Failure kBroken{Failure::Kind::platform, "the disk is gone"};
 /// A store whose answers the test gives.
 class ScriptedStore final : public HomeStore {
  public:
-  Status replaceHomes(const std::vector<HomeData>&) override { return std::nullopt; }
-  Status mergeHomes(const std::vector<HomeData>&) override { return std::nullopt; }
+  Status replaceHomes(const std::vector<HomeData>&, const StoreProgress&) override {
+    return std::nullopt;
+  }
+  Status mergeHomes(const std::vector<HomeData>&, const StoreProgress&) override {
+    return std::nullopt;
+  }
   Status editHomes(const HomeEdit&) override { return std::nullopt; }
   Result<std::vector<HomeData>> loadHomes() override {
     ++loads;

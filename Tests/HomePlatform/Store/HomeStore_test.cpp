@@ -6,6 +6,7 @@
 #include <atomic>
 #include <bit>
 #include <cmath>
+#include <csignal>
 #include <limits>
 #include <string>
 #include <thread>
@@ -403,6 +404,42 @@ TEST_F(HomeStoreTest, MayBeUsedFromManyThreads) {
   for (std::thread& thread : threads) thread.join();
   EXPECT_EQ(failures, 0);
   EXPECT_EQ(lamp(*store).value->integerValue(), 9);
+}
+
+/// Notes what a progress is told.
+StoreProgress notedIn(std::vector<std::size_t>& numbers) {
+  return [&numbers](std::size_t accessories) { numbers.push_back(accessories); };
+}
+
+TEST_F(HomeStoreTest, TellsHowManyAccessoriesAreStored) {
+  auto store = open();
+  HomeData second = lampHome();
+  second.uuid = testUUID(5);
+  std::vector<std::size_t> numbers;
+  ASSERT_FALSE(store->replaceHomes({lampHome(), second}, notedIn(numbers)));
+  EXPECT_EQ(numbers, (std::vector<std::size_t>{0, 1, 2}));
+  numbers.clear();
+  ASSERT_FALSE(store->mergeHomes({second}, notedIn(numbers)));
+  EXPECT_EQ(numbers, (std::vector<std::size_t>{0, 1}));
+  numbers.clear();
+  ASSERT_FALSE(store->replaceHomes({}, notedIn(numbers)));
+  EXPECT_EQ(numbers, (std::vector<std::size_t>{0}));
+}
+
+TEST_F(HomeStoreTest, KeepsTheHomesWhenKilledWhileStoring) {
+  const std::vector<HomeData> homes = {lampHome(), namedHome(5, "Hut")};
+  ASSERT_FALSE(open()->replaceHomes({namedHome(7, "Tent")}));
+  const std::string before = contents(*open());
+  for (const std::size_t last : {std::size_t{0}, std::size_t{1}}) {
+    const auto dieAt = [last](std::size_t accessories) {
+      if (accessories == last) std::raise(SIGKILL);
+    };
+    EXPECT_EXIT(static_cast<void>(open()->replaceHomes(homes, dieAt)),
+                testing::KilledBySignal(SIGKILL), "");
+    EXPECT_EXIT(static_cast<void>(open()->mergeHomes(homes, dieAt)),
+                testing::KilledBySignal(SIGKILL), "");
+    EXPECT_EQ(contents(*open()), before);
+  }
 }
 
 }  // namespace
