@@ -9,6 +9,7 @@
 #include <string>
 #include <system_error>
 
+#include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
 
 namespace nidus {
@@ -52,6 +53,7 @@ mode_t permissionsFor(const std::filesystem::path& file) {
 }
 
 Status replaceOrdinary(const std::filesystem::path& file, std::string_view text) {
+  const InterruptionHold hold;  // nothing is left beside the file
   std::string temporary = file.string() + ".XXXXXX";
   const OpenFile open(mkostemp(temporary.data(), O_CLOEXEC));
   if (!open.isOpen()) return writeFailure(file, errno);

@@ -9,6 +9,7 @@
 #include "nidus/Commands/Commands.h"
 #include "nidus/Commands/DemoSteps.h"
 #include "nidus/Commands/HomeInput.h"
+#include "nidus/InterruptionHold.h"
 #include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/TemporaryFolder.h"
@@ -92,6 +93,7 @@ class Demonstration {
 };
 
 ExitStatus demonstrate() {
+  const InterruptionHold hold;  // the folder is removed first
   const auto folder = TemporaryFolder::make();
   if (!folder) return report(folder.failure());
   HomePlatformOptions options;

@@ -1,5 +1,8 @@
 #include "nidus/Commands/HomeChange.h"
 
+#include <optional>
+
+#include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Workspace.h"
 
@@ -10,7 +13,9 @@ ExitStatus changeHomes(Workspace& workspace, const HomeChange& change) {
   if (!session) return report(session.failure());
   HomePlatform& platform = (*session)->platform();
   std::string sentence;
+  std::optional<InterruptionHold> hold;
   const auto failure = platform.editHomes([&](std::vector<HomeData>& homes) {
+    hold.emplace();  // until the change is lasting and the preferences suit it
     const auto done = change(homes, platform.vocabulary());
     if (!done) return Status(done.failure());
     sentence = *done;
