@@ -1,9 +1,13 @@
+#include <cstddef>
 #include <memory>
+#include <optional>
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/Commands/HomeInput.h"
+#include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/Terminal/Progress.h"
 #include "nidus/Workspace.h"
 
 namespace nidus {
@@ -14,12 +18,26 @@ struct ImportOptions {
   bool merges = false;
 };
 
+/// Puts the homes into the database. An interruption before they are all stored leaves it as it
+/// was; one after that waits in `hold` until they are lasting and the preference suits them.
+Status storeHomes(const std::vector<HomeData>& homes, bool merges, HomePlatform& platform,
+                  std::optional<InterruptionHold>& hold) {
+  constexpr std::size_t kManyAccessories = 500;
+  const std::size_t total = accessoriesOf(homes);
+  Progress progress({"Storing", total, accessoriesText(total), kManyAccessories});
+  return platform.importHomes(homes, merges, [&progress, &hold, total](std::size_t stored) {
+    progress.reach(stored);
+    if (stored == total) hold.emplace();
+  });
+}
+
 ExitStatus importHomes(const ImportOptions& options, Workspace& workspace) {
   const auto homes = readHomes(options.file);
   if (!homes) return report(homes.failure());
   const auto session = workspace.home();
   if (!session) return report(session.failure());
-  if (auto failure = (*session)->platform().importHomes(*homes, options.merges)) {
+  std::optional<InterruptionHold> hold;
+  if (auto failure = storeHomes(*homes, options.merges, (*session)->platform(), hold)) {
     return report(*failure);
   }
   return printText("imported " + sizeOf(*homes) + '\n');
