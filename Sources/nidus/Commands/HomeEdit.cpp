@@ -2,6 +2,7 @@
 #include <cstdlib>
 #include <fstream>
 #include <memory>
+#include <optional>
 #include <sstream>
 #include <utility>
 
@@ -11,6 +12,7 @@
 #include "nidus/FileReplacement.h"
 #include "nidus/HomeEditing/HomeDifference.h"
 #include "nidus/HomeEditing/HomeMerge.h"
+#include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/TemporaryFolder.h"
 #include "nidus/Terminal/ForegroundProgram.h"
@@ -106,7 +108,9 @@ class HomeEditor {
     if (!isConfirmed_ && !ask("Import this?")) {
       return std::max(ExitStatus::otherOutcome, sayKept("nothing was changed; "));
     }
+    std::optional<InterruptionHold> hold;
     const auto failure = platform_.editHomes([&](std::vector<HomeData>& homes) {
+      hold.emplace();  // until the change is lasting and the preferences suit it
       auto merged = mergeEdit(exported_, std::move(edited), homes);
       if (!merged) return Status(merged.failure());
       homes = std::move(*merged);
