@@ -70,6 +70,9 @@ std::string commandText(const Order& order, const Replies& replies, const Vocabu
   return text;
 }
 
+/// An outcome of our own: the plug-in answers what has no limits without a value.
+constexpr const char kWithoutLimits[] = "WITHOUT_LIMITS";
+
 /// The reply that a sentence is about: the first with an outcome other than that of one without a
 /// limit of its kind, else a success with all objects.
 ReplyForm jointReply(const std::vector<ReplyForm>& replies,
@@ -77,7 +80,10 @@ ReplyForm jointReply(const std::vector<ReplyForm>& replies,
   ReplyForm joint;
   joint.outcome = VAHACommandOutcomeFOUND_NO_MATCHING_ENTITIESValue;
   if (!objects.empty()) joint.outcome = VAHACommandOutcomeCOMMAND_SUCCESSValue;
-  for (const ObjectLimits& entry : objects) joint.results.push_back(entry.object);
+  for (const ObjectLimits& entry : objects) {
+    joint.results.push_back(entry.object);
+    if (!entry.hasAny()) joint.results.back().outcome = kWithoutLimits;
+  }
   for (const ReplyForm& reply : replies) {
     const bool isUsual = reply.outcome == VAHACommandOutcomeCOMMAND_SUCCESSValue ||
                          reply.outcome == VAHACommandOutcomeFOUND_NO_MATCHING_ENTITIESValue;

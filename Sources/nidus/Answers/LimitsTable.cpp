@@ -28,14 +28,19 @@ ObjectLimits& entryFor(const ObjectResult& object, std::size_t limit,
 
 }  // namespace
 
+bool ObjectLimits::hasAny() const {
+  return std::any_of(limits.begin(), limits.end(),
+                     [](const std::string& limit) { return limit != kNoLimit; });
+}
+
 std::vector<ObjectLimits> limitsByObject(const std::vector<ReplyForm>& replies,
                                          const std::string& attribute,
                                          const Vocabulary& vocabulary) {
   std::vector<ObjectLimits> objects;
   for (std::size_t limit = 0; limit < replies.size(); ++limit) {
     for (const ObjectResult& result : replies[limit].results) {
-      entryFor(result, limit, objects).limits.at(limit) =
-          limitText(result.value, attribute, vocabulary);
+      std::string& text = entryFor(result, limit, objects).limits.at(limit);
+      if (!result.value.empty()) text = limitText(result.value, attribute, vocabulary);
     }
   }
   return objects;

@@ -14,6 +14,8 @@ namespace nidus {
 struct ObjectLimits {
   ObjectResult object;
   std::array<std::string, 3> limits;  ///< Minimum, maximum and step.
+
+  [[nodiscard]] bool hasAny() const;
 };
 
 /// Brings the replies for the minimum, the maximum and the step together, an entry for each object

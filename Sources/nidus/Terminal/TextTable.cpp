@@ -1,6 +1,8 @@
 #include "nidus/Terminal/TextTable.h"
 
 #include <algorithm>
+#include <cstddef>
+#include <iterator>
 #include <numeric>
 
 namespace nidus {
@@ -10,15 +12,25 @@ constexpr std::size_t kGapCells = 2;
 /// Below this a column says nothing any more.
 constexpr std::size_t kNarrowestCells = 6;
 
-/// Takes cells off the widest of `widths` until the table fits.
-void fit(std::vector<std::size_t>& widths, std::size_t columns) {
-  if (columns == 0 || widths.empty()) return;
-  const std::size_t gaps = kGapCells * (widths.size() - 1);
-  while (std::accumulate(widths.begin(), widths.end(), gaps) > columns) {
-    std::size_t& widest = *std::max_element(widths.begin(), widths.end());
+std::size_t lineOf(const std::vector<std::size_t>& widths) {
+  return std::accumulate(widths.begin(), widths.end(), kGapCells * (widths.size() - 1));
+}
+
+/// Takes cells off the widest of the first `shrinking` columns until the table fits.
+void shrink(std::vector<std::size_t>& widths, std::ptrdiff_t shrinking, std::size_t columns) {
+  while (shrinking > 0 && lineOf(widths) > columns) {
+    std::size_t& widest = *std::max_element(widths.begin(), widths.begin() + shrinking);
     if (widest <= kNarrowestCells) return;
     --widest;
   }
+}
+
+/// Makes the table fit where it can; the last column gives way last.
+void fit(std::vector<std::size_t>& widths, std::size_t columns) {
+  if (columns == 0) return;
+  const std::ptrdiff_t count = std::ssize(widths);
+  shrink(widths, count - 1, columns);
+  shrink(widths, count, columns);
 }
 
 /// One line of a table, made from left to right.

@@ -23,8 +23,8 @@ struct TextCell {
 };
 
 /// A table of text under titles. Its columns are as wide as what stands in them; where that is more
-/// than the terminal has, the widest ones are shortened. A column in which nothing stands is left
-/// out.
+/// than the terminal has, the widest ones are shortened, the last one only when nothing else helps.
+/// A column in which nothing stands is left out.
 ///
 ///     TextTable table({"OBJECT", "ROOM"});
 ///     table.addRow({lamp.name, lamp.room});

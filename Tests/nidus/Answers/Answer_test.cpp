@@ -137,6 +137,17 @@ TEST_F(AnswerTest, KeepsLimitsOfNamesakesApart) {
             "2 lights with limits\n");
 }
 
+TEST_F(AnswerTest, CountsWhatHasNoLimitsApart) {
+  const ResultSpec sensor = {.name = "Sensor"};
+  const ResultSpec lamp = {.name = "Lamp", .value = integerForm(1)};
+  const Replies replies = {replyOf({lamp, sensor})};
+  EXPECT_EQ(answer(orderOf(Order::Kind::limits, "BRIGHTNESS"), {replies, replies, replies}),
+            "OBJECT  ROOM     HOME   MINIMUM  MAXIMUM  STEP\n"
+            "Lamp    Kitchen  Cabin  1 %      1 %      1 %\n"
+            "Sensor  Kitchen  Cabin  none     none     none\n"
+            "1 light with limits, 1 without limits: Sensor\n");
+}
+
 TEST_F(AnswerTest, SaysThatThereAreNoLimits) {
   EXPECT_EQ(answer(orderOf(Order::Kind::limits), {{replyOf({})}, {replyOf({})}, {replyOf({})}}),
             "Nothing matches that has limits; see why with nidus explain and the same words\n");

@@ -62,6 +62,13 @@ TEST(TextTableTest, LeavesSomethingOfEachColumn) {
   EXPECT_EQ(table.text(terminalOf(3)), "OBJECT  ROOM\nCeili…  Livin…\n");
 }
 
+TEST(TextTableTest, ShortensTheLastColumnLast) {
+  TextTable table({"OBJECT", "OUTCOME"});
+  table.addRow({"Ceiling", "unreachable"});
+  EXPECT_EQ(table.text(terminalOf(19)), "OBJECT  OUTCOME\nCeili…  unreachable\n");
+  EXPECT_EQ(table.text(terminalOf(16)), "OBJECT  OUTCOME\nCeili…  unreach…\n");
+}
+
 TEST(TextTableTest, NeverShortensInAPipe) {
   TextTable table({"OBJECT"});
   table.addRow({std::string(500, 'x')});
