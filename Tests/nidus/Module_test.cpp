@@ -18,15 +18,15 @@ class InstalledModuleTest : public ProgramTest {
   [[nodiscard]] std::string program() const { return folder_.file("bin/nidus"); }
   [[nodiscard]] std::string module() const { return folder_.file("lib/nidus/NidusAssistant.so"); }
   void install(const char* module) const { std::filesystem::copy_file(module, this->module()); }
-  [[nodiscard]] ProgramEnd runInstalled(const std::string& command,
+  [[nodiscard]] ProgramEnd runInstalled(std::vector<std::string> arguments,
                                         const std::string& input = "") const {
-    ProgramStart installed = start({command}, input);
+    ProgramStart installed = start(std::move(arguments), input);
     installed.program = program();
     installed.environment = {{"LD_LIBRARY_PATH", NIDUS_LIBRARIES}};
     return runProgram(installed);
   }
   void expectModuleFailure(const std::string& reason) const {
-    const ProgramEnd end = runInstalled("records");
+    const ProgramEnd end = runInstalled({"records"});
     EXPECT_EQ(end.exitStatus, 4);
     EXPECT_THAT(end.output, IsEmpty());
     EXPECT_THAT(end.errors, IsOneFailure(module() + ": " + reason));
@@ -59,15 +59,28 @@ TEST_F(InstalledModuleTest, IsNotLookedForInTheWorkingFolder) {
 
 TEST_F(InstalledModuleTest, MayGiveNoReply) {
   install(NIDUS_SILENT_MODULE);
-  const ProgramEnd end = runInstalled("perform", "{}\n");
+  const ProgramEnd end = runInstalled({"perform"}, "{}\n");
   EXPECT_EQ(end.exitStatus, 3);
   EXPECT_THAT(end.output, IsEmpty());
   EXPECT_THAT(end.errors, IsOneFailure("standard input: line 1: the plug-in gave no reply"));
 }
 
+TEST_F(InstalledModuleTest, MayGiveNoReplyToAnOrder) {
+  install(NIDUS_SILENT_MODULE);
+  for (const char* form : {"--json", "--locked"}) {
+    const ProgramEnd end = runInstalled({"set", "brightness", "maximum", form});
+    EXPECT_EQ(end.exitStatus, 3);
+    EXPECT_THAT(end.output, IsEmpty());
+    EXPECT_THAT(end.errors, IsOneFailure("the plug-in gave no reply"));
+  }
+  const ProgramEnd quiet = runInstalled({"limits", "brightness", "--quiet"});
+  EXPECT_EQ(quiet.exitStatus, 3);
+  EXPECT_THAT(quiet.errors, IsEmpty());
+}
+
 TEST_F(InstalledModuleTest, MayNotAnswerASync) {
   install(NIDUS_SILENT_MODULE);
-  const ProgramEnd end = runInstalled("sync");
+  const ProgramEnd end = runInstalled({"sync"});
   EXPECT_EQ(end.exitStatus, 3);
   EXPECT_THAT(end.output, IsEmpty());
   EXPECT_THAT(end.errors, IsOneFailure("the plug-in did not answer the sync"));
@@ -75,12 +88,12 @@ TEST_F(InstalledModuleTest, MayNotAnswerASync) {
 
 TEST_F(InstalledModuleTest, CountsNoReplyAboveBadInput) {
   install(NIDUS_SILENT_MODULE);
-  EXPECT_EQ(runInstalled("perform", "x\n{}\nx\n").exitStatus, 3);
+  EXPECT_EQ(runInstalled({"perform"}, "x\n{}\nx\n").exitStatus, 3);
 }
 
 TEST_F(InstalledModuleTest, MakesADemonstrationFail) {
   install(NIDUS_SILENT_MODULE);
-  const ProgramEnd end = runInstalled("demo");
+  const ProgramEnd end = runInstalled({"demo"});
   EXPECT_EQ(end.exitStatus, 1);
   EXPECT_THAT(end.errors, HasSubstr("nidus: demo: this differs from what was expected"));
 }
