@@ -1,6 +1,7 @@
 #include <algorithm>
 
 #include "nidus/ProgramTest.h"
+#include "nidus/TerminalProcess.h"
 
 namespace nidus {
 namespace {
@@ -200,6 +201,29 @@ TEST_F(OrdersTest, SetsToTheLimitOfTheDevice) {
 
 TEST_F(OrdersTest, FindsNoLimitWhereThereIsNone) {
   EXPECT_EQ(run({"set", "brightness", "maximum", "--service", "Kettle"}).exitStatus, 1);
+}
+
+TEST_F(OrdersTest, HasColourOnATerminalAlone) {
+  const std::vector<std::string> order = {"get", "brightness", "--service", "Garage Light"};
+  const ProgramEnd shown = runOnTerminal(start(order));
+  EXPECT_EQ(shown.exitStatus, 0);
+  EXPECT_THAT(shown.output, AllOf(HasSubstr("unreachable"), HasSubstr("\x1b[")));
+  const ProgramEnd piped = run(order);
+  EXPECT_THAT(piped.output, AllOf(HasSubstr("unreachable"), Not(HasSubstr("\x1b["))));
+}
+
+TEST_F(OrdersTest, KeepsRepliesPlainOnATerminal) {
+  const ProgramEnd end =
+      runOnTerminal(start({"get", "power", "--service", "Desk Lamp", "--json"}), 20);
+  EXPECT_EQ(end.exitStatus, 0);
+  EXPECT_EQ(end.output.find("{\"commandOutcome\""), 0U);
+  EXPECT_THAT(end.output, Not(HasSubstr("\x1b")));
+}
+
+TEST_F(OrdersTest, CanSayNothingOnATerminal) {
+  const ProgramEnd end = runOnTerminal(start({"set", "power", "off", "--quiet"}));
+  EXPECT_EQ(end.exitStatus, 0);
+  EXPECT_THAT(end.output, IsEmpty());
 }
 
 /// Two lamps whose brightness has different limits.

@@ -43,12 +43,15 @@ struct Order {
     run,     ///< A scene.
   };
   Kind kind = Kind::get;
-  std::string attribute;             ///< The assistant's name; empty: only which objects.
-  std::vector<CommandRef> commands;  ///< One, but for limits; none is null.
+  std::string attribute;  ///< The assistant's name; empty: only which objects.
+  /// One, but for limits, and for a minimum or maximum that is not the same for all objects; none
+  /// is null.
+  std::vector<CommandRef> commands;
 };
 
-/// Turns a person's words into commands. `isMetric` is the metric flag of the device. A failure is
-/// bad input and names the word, with a near miss where there is one.
+/// Turns a person's words into commands. `isMetric` is the metric flag of the device. An order to a
+/// minimum or maximum has no value yet (see `withLimitValues`). A failure is bad input and names
+/// the word, with a near miss where there is one.
 [[nodiscard]] Result<Order> readOrder(const OrderWords& order, const Vocabulary& vocabulary,
                                       bool isMetric);
 

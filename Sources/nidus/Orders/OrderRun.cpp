@@ -31,6 +31,7 @@ Result<std::vector<Replies>> performOrder(Session& session, const Order& order) 
 
 ExitStatus statusOf(const Order& order, const std::vector<Replies>& replies) {
   std::vector<ExitStatus> statuses;
+  statuses.reserve(replies.size());
   for (const Replies& ofCommand : replies) statuses.push_back(statusOf(ofCommand));
   const auto [least, greatest] = std::minmax_element(statuses.begin(), statuses.end());
   return order.kind == Order::Kind::limits ? *least : *greatest;
