@@ -48,6 +48,14 @@ class ParserSyntax final : public CommandSyntax {
               const std::string& help) override {
     app_.add_option(name, target, help)->option_text(value);
   }
+  void requiredOption(const std::string& name, const std::string& value, std::string& target,
+                      const std::string& help) override {
+    app_.add_option(name, target, help)->option_text(value + " (required)")->required();
+  }
+  void repeatedOption(const std::string& name, const std::string& value,
+                      std::vector<std::string>& target, const std::string& help) override {
+    app_.add_option(name, target, help)->option_text(value)->allow_extra_args(false);
+  }
   void argument(const std::string& name, std::string& target, const std::string& help) override {
     app_.add_option(name, target, help)->option_text(" ");
   }

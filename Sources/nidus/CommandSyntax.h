@@ -31,6 +31,11 @@ class CommandSyntax {
   /// Adds an option with a value, such as "--data"; `value` names it in the help.
   virtual void option(const std::string& name, const std::string& value, std::string& target,
                       const std::string& help) = 0;
+  /// The same, and it must be there; and one that may be repeated, each time with one value.
+  virtual void requiredOption(const std::string& name, const std::string& value,
+                              std::string& target, const std::string& help) = 0;
+  virtual void repeatedOption(const std::string& name, const std::string& value,
+                              std::vector<std::string>& target, const std::string& help) = 0;
   /// Adds an argument that may be left out, and one that must be there.
   virtual void argument(const std::string& name, std::string& target, const std::string& help) = 0;
   virtual void requiredArgument(const std::string& name, std::string& target,

@@ -12,6 +12,7 @@ void declareHomeImport(CommandSyntax& home, Workspace& workspace);
 void declareHomeExport(CommandSyntax& home, Workspace& workspace);
 void declareHomeShow(CommandSyntax& home, Workspace& workspace);
 void declareHomeCheck(CommandSyntax& home);
+void declareHomeAdd(CommandSyntax& home, Workspace& workspace);
 void declareHomeRename(CommandSyntax& home, Workspace& workspace);
 void declareHomeMove(CommandSyntax& home, Workspace& workspace);
 void declareHomeRemove(CommandSyntax& home, Workspace& workspace);

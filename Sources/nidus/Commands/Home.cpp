@@ -9,6 +9,7 @@ void declareHome(CommandSyntax& program, Workspace& workspace) {
   declareHomeExport(home, workspace);
   declareHomeShow(home, workspace);
   declareHomeCheck(home);
+  declareHomeAdd(home, workspace);
   declareHomeRename(home, workspace);
   declareHomeMove(home, workspace);
   declareHomeRemove(home, workspace);

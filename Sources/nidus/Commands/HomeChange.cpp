@@ -12,11 +12,13 @@ ExitStatus changeHomes(Workspace& workspace, const HomeChange& change) {
   const auto session = workspace.home();
   if (!session) return report(session.failure());
   HomePlatform& platform = (*session)->platform();
+  const HomeWording wording{platform.vocabulary(),
+                            platform.locale()->usesMetricSystem().value_or(false)};
   std::string sentence;
   std::optional<InterruptionHold> hold;
   const auto failure = platform.editHomes([&](std::vector<HomeData>& homes) {
     hold.emplace();  // until the change is lasting and the preferences suit it
-    const auto done = change(homes, platform.vocabulary());
+    const auto done = change(homes, wording);
     if (!done) return Status(done.failure());
     sentence = *done;
     return Status();

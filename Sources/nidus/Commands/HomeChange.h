@@ -13,9 +13,15 @@ namespace nidus {
 
 class Workspace;
 
+/// What a change of the homes needs to understand people.
+struct HomeWording {
+  const Vocabulary& vocabulary;
+  bool isMetric;  ///< The metric flag of the device.
+};
+
 /// Changes homes and gives what was done, in a sentence without its end; or fails.
 using HomeChange =
-    std::function<Result<std::string>(std::vector<HomeData>& homes, const Vocabulary& vocabulary)>;
+    std::function<Result<std::string>(std::vector<HomeData>& homes, const HomeWording& wording)>;
 
 /// Makes a change of the homes in the database, whole or not at all, and prints what was done.
 [[nodiscard]] ExitStatus changeHomes(Workspace& workspace, const HomeChange& change);

@@ -35,9 +35,10 @@ void declareAccessoryMove(CommandSyntax& move, Workspace& workspace) {
                        kStatuses);
   declareObjectArguments(syntax, words->accessory);
   syntax.option("--to", "ROOM", words->room, "The name or UUID of the room");
+  syntax.candidates("--to", {candidatesOf(ObjectKind::room)});
   syntax.flag("--to-no-room", words->isOut, "It stands in no room of its home");
   syntax.run([words, &workspace] {
-    return changeHomes(workspace, [&](std::vector<HomeData>& homes, const Vocabulary&) {
+    return changeHomes(workspace, [&](std::vector<HomeData>& homes, const HomeWording&) {
       return nidus::move(homes, *words);
     });
   });
@@ -75,8 +76,10 @@ void declareMoveBetweenLists(const MoveBetweenLists& kind, CommandSyntax& move,
   const std::string list = wordOf(kind.list);
   syntax.option("--to-" + list, "NAME", words->lists.to, "The name or UUID of the " + list);
   syntax.option("--from-" + list, "NAME", words->lists.from, "The name or UUID of the " + list);
+  syntax.candidates("--to-" + list, {candidatesOf(kind.list)});
+  syntax.candidates("--from-" + list, {candidatesOf(kind.list)});
   syntax.run([words, &kind, &workspace] {
-    return changeHomes(workspace, [&](std::vector<HomeData>& homes, const Vocabulary&) {
+    return changeHomes(workspace, [&](std::vector<HomeData>& homes, const HomeWording&) {
       return kind.move(homes, words->member, words->lists);
     });
   });

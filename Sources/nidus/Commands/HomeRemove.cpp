@@ -19,7 +19,7 @@ struct RemovalWords {
 };
 
 ExitStatus removeConfirmed(const ObjectWords& object, Workspace& workspace) {
-  return changeHomes(workspace, [&](std::vector<HomeData>& homes, const Vocabulary&) {
+  return changeHomes(workspace, [&](std::vector<HomeData>& homes, const HomeWording&) {
     auto removed = removeObject(homes, object);
     return removed ? Result<std::string>("removed " + *removed) : removed;
   });
@@ -28,7 +28,7 @@ ExitStatus removeConfirmed(const ObjectWords& object, Workspace& workspace) {
 /// Removes what a person has agreed to, which was `agreed` then.
 ExitStatus removeAgreed(const ObjectWords& object, const std::string& agreed,
                         Workspace& workspace) {
-  return changeHomes(workspace, [&](std::vector<HomeData>& homes, const Vocabulary&) {
+  return changeHomes(workspace, [&](std::vector<HomeData>& homes, const HomeWording&) {
     auto removed = removeObject(homes, object);
     if (!removed) return removed;
     if (*removed == agreed) return Result<std::string>("removed " + agreed);

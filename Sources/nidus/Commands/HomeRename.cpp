@@ -23,7 +23,7 @@ void declareRenamingOf(ObjectKind kind, CommandSyntax& rename, Workspace& worksp
   declareObjectArguments(syntax, words->object);
   syntax.requiredArgument("NEWNAME", words->newName, "The name that it gets");
   syntax.run([words, &workspace] {
-    return changeHomes(workspace, [&](std::vector<HomeData>& homes, const Vocabulary&) {
+    return changeHomes(workspace, [&](std::vector<HomeData>& homes, const HomeWording&) {
       return renameObject(homes, words->object, words->newName);
     });
   });

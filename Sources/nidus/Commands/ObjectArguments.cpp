@@ -2,14 +2,37 @@
 
 namespace nidus {
 
+Candidates candidatesOf(ObjectKind kind) {
+  switch (kind) {
+    case ObjectKind::home:
+      return {CandidateKind::homes};
+    case ObjectKind::room:
+      return {CandidateKind::rooms};
+    case ObjectKind::zone:
+      return {CandidateKind::zones};
+    case ObjectKind::service:
+      return {CandidateKind::services};
+    case ObjectKind::group:
+      return {CandidateKind::groups};
+    case ObjectKind::scene:
+      return {CandidateKind::scenes};
+    case ObjectKind::accessory:
+    case ObjectKind::trigger:
+      break;
+  }
+  return {};
+}
+
 void declareObjectArguments(CommandSyntax& syntax, ObjectWords& words) {
   const bool isService = words.kind == ObjectKind::service;
   syntax.requiredArgument(
       "NAME", words.name,
       isService ? "Its name, or ACCESSORY/NAME, or ACCESSORY/INSTANCE-ID" : "Its name or UUID");
+  syntax.candidates("NAME", {candidatesOf(words.kind)});
   if (words.kind == ObjectKind::home) return;
   syntax.option("--home", "HOME", words.home,
                 "The name or UUID of its home, where several homes have the name");
+  syntax.candidates("--home", {{CandidateKind::homes}});
 }
 
 std::string withArticle(ObjectKind kind) {

@@ -9,6 +9,9 @@ namespace nidus {
 /// `words` have; a home has no option --home. `words` live as long as the command.
 void declareObjectArguments(CommandSyntax& syntax, ObjectWords& words);
 
+/// The names of the objects of a kind, as far as they can be completed.
+[[nodiscard]] Candidates candidatesOf(ObjectKind kind);
+
 /// "a room", "an accessory".
 [[nodiscard]] std::string withArticle(ObjectKind kind);
 

@@ -39,6 +39,16 @@ void CommandOutline::option(const std::string& name, const std::string&, std::st
   options_.push_back({.names = namesIn(name), .takesValue = true, .target = &target});
 }
 
+void CommandOutline::requiredOption(const std::string& name, const std::string& value,
+                                    std::string& target, const std::string& help) {
+  option(name, value, target, help);
+}
+
+void CommandOutline::repeatedOption(const std::string& name, const std::string&,
+                                    std::vector<std::string>&, const std::string&) {
+  options_.push_back({.names = namesIn(name), .takesValue = true});
+}
+
 void CommandOutline::argument(const std::string& name, std::string&, const std::string&) {
   arguments_.push_back({.names = {name}});
 }

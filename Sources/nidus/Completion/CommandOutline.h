@@ -24,7 +24,7 @@ class CommandOutline final : public CommandSyntax {
     bool takesValue = false;
     bool takesAllWords = false;
     std::vector<Candidates> ofWords = {};
-    std::string* target = nullptr;  ///< Of an option with a value.
+    std::string* target = nullptr;  ///< Of an option with one value.
   };
 
   explicit CommandOutline(std::string name = "nidus", const CommandOutline* above = nullptr);
@@ -34,6 +34,10 @@ class CommandOutline final : public CommandSyntax {
   void flag(const std::string& name, bool& target, const std::string& help) override;
   void option(const std::string& name, const std::string& value, std::string& target,
               const std::string& help) override;
+  void requiredOption(const std::string& name, const std::string& value, std::string& target,
+                      const std::string& help) override;
+  void repeatedOption(const std::string& name, const std::string& value,
+                      std::vector<std::string>& target, const std::string& help) override;
   void argument(const std::string& name, std::string& target, const std::string& help) override;
   void requiredArgument(const std::string& name, std::string& target,
                         const std::string& help) override;

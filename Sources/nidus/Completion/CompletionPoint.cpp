@@ -60,7 +60,7 @@ class CommandWalk {
   }
 
   void setValue(const CommandOutline::Item& option, const std::string& value) {
-    *option.target = value;
+    if (option.target) *option.target = value;
     if (option.ofWords.empty()) return;
     const auto& kinds = option.ofWords.front().kinds;
     if (std::find(kinds.begin(), kinds.end(), CandidateKind::homes) != kinds.end()) home_ = value;

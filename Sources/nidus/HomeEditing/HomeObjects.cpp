@@ -124,21 +124,6 @@ bool isNamedAt(const std::vector<HomeData>& homes, ObjectKind kind, const Object
   return isSought;
 }
 
-/// What names the object at `place` beyond doubt.
-std::string identityAt(const std::vector<HomeData>& homes, ObjectKind kind,
-                       const ObjectPlace& place) {
-  if (kind == ObjectKind::service) {
-    const AccessoryData& accessory = homes[place.home].accessories[place.index];
-    return accessory.uuid.UUIDString().str() + '/' +
-           std::to_string(accessory.services[place.service].instanceID);
-  }
-  std::string text;
-  visitAt(homes, kind, place, [&](const auto& object) {
-    if constexpr (requires { object.uuid; }) text = object.uuid.UUIDString().str();
-  });
-  return text;
-}
-
 /// The name as it is shown, and as it can be given; a service's with that of its accessory.
 std::string spellingAt(const std::vector<HomeData>& homes, ObjectKind kind,
                        const ObjectPlace& place) {
@@ -241,6 +226,20 @@ const NDString& nameAt(const std::vector<HomeData>& homes, ObjectKind kind,
 
 NDString& nameAt(std::vector<HomeData>& homes, ObjectKind kind, const ObjectPlace& place) {
   return visitAt(homes, kind, place, [](auto& object) -> NDString& { return object.name; });
+}
+
+std::string identityAt(const std::vector<HomeData>& homes, ObjectKind kind,
+                       const ObjectPlace& place) {
+  if (kind == ObjectKind::service) {
+    const AccessoryData& accessory = homes[place.home].accessories[place.index];
+    return accessory.uuid.UUIDString().str() + '/' +
+           std::to_string(accessory.services[place.service].instanceID);
+  }
+  std::string text;
+  visitAt(homes, kind, place, [&](const auto& object) {
+    if constexpr (requires { object.uuid; }) text = object.uuid.UUIDString().str();
+  });
+  return text;
 }
 
 std::string describe(const std::vector<HomeData>& homes, ObjectKind kind,

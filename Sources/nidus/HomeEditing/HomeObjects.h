@@ -56,6 +56,11 @@ struct ObjectPlace {
 [[nodiscard]] NDString& nameAt(std::vector<HomeData>& homes, ObjectKind kind,
                                const ObjectPlace& place);
 
+/// What names the object at `place` within its home beyond doubt: its UUID; for a service that of
+/// its accessory, a slash and its instance ID.
+[[nodiscard]] std::string identityAt(const std::vector<HomeData>& homes, ObjectKind kind,
+                                     const ObjectPlace& place);
+
 /// Such as "the room Kitchen of Beach House"; a service comes with its accessory: "the service
 /// Floor lamp/Lamp of Beach House".
 [[nodiscard]] std::string describe(const std::vector<HomeData>& homes, ObjectKind kind,
