@@ -8,26 +8,10 @@ namespace {
 
 NDDictionaryValue textOf(const NDUUID& uuid) { return NDDictionaryValue(uuid.UUIDString()); }
 
-NDDictionaryValue valueOf(const NDValueRef& value) {
-  if (!value) return {};
-  if (value->isBoolean()) return NDDictionaryValue(value->boolValue());
-  if (value->isInteger()) return NDDictionaryValue(value->integerValue());
-  if (value->isFloating()) return NDDictionaryValue(value->floatValue());
-  return NDDictionaryValue(value->stringValue());
-}
-
-NDDictionary addressOf(const CharacteristicAddress& address) {
-  NDDictionary dictionary;
-  dictionary.set("accessory", textOf(address.accessory));
-  dictionary.set("service", NDDictionaryValue(address.service));
-  dictionary.set("characteristic", NDDictionaryValue(address.characteristic));
-  return dictionary;
-}
-
 NDDictionaryList readsOf(const PlatformCall& call) {
   NDDictionaryList reads;
   for (const CharacteristicAddress& address : call.characteristics) {
-    reads.emplace_back(addressOf(address));
+    reads.emplace_back(transcriptOf(address));
   }
   return reads;
 }
@@ -35,8 +19,8 @@ NDDictionaryList readsOf(const PlatformCall& call) {
 NDDictionaryList writesOf(const PlatformCall& call) {
   NDDictionaryList writes;
   for (std::size_t i = 0; i < call.characteristics.size(); ++i) {
-    NDDictionary write = addressOf(call.characteristics[i]);
-    write.set("value", valueOf(call.values[i]));
+    NDDictionary write = transcriptOf(call.characteristics[i]);
+    write.set("value", transcriptOf(call.values[i]));
     writes.emplace_back(std::move(write));
   }
   return writes;
@@ -50,6 +34,22 @@ NDDictionary callNamed(const char* name, const PlatformCall& call) {
 }
 
 }  // namespace
+
+NDDictionaryValue transcriptOf(const NDValueRef& value) {
+  if (!value) return {};
+  if (value->isBoolean()) return NDDictionaryValue(value->boolValue());
+  if (value->isInteger()) return NDDictionaryValue(value->integerValue());
+  if (value->isFloating()) return NDDictionaryValue(value->floatValue());
+  return NDDictionaryValue(value->stringValue());
+}
+
+NDDictionary transcriptOf(const CharacteristicAddress& address) {
+  NDDictionary dictionary;
+  dictionary.set("accessory", textOf(address.accessory));
+  dictionary.set("service", NDDictionaryValue(address.service));
+  dictionary.set("characteristic", NDDictionaryValue(address.characteristic));
+  return dictionary;
+}
 
 NDDictionary transcriptOf(const PlatformCall& call) {
   if (call.kind == PlatformCall::Kind::read) {

@@ -98,6 +98,7 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   declareRecords(program, workspace);
   declareVocabulary(program, workspace);
   declarePreferences(program, workspace);
+  declareExplain(program, workspace);
   declareReplay(program);
   declareDemo(program);
   declareDoctor(program, workspace);

@@ -26,6 +26,8 @@ class Workspace {
   [[nodiscard]] Result<Session*> home();
   /// The same with the plug-in's module open.
   [[nodiscard]] Result<Session*> assistant();
+  /// Ends the session, so that another platform can be registered; the next use opens a new one.
+  void close() { session_.reset(); }
 
  private:
   Settings settings_;

@@ -41,6 +41,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"vocabulary"}, {"WORD", "--json", "Exit status"}},
       {{"preferences"}, {"list", "get", "set", "unset", "preferences.json"}},
       {{"preferences", "set"}, {"KEY", "VALUE", "Exit status"}},
+      {{"explain"}, {"ORDER", "--command", "--json", "--room", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
       {{"completion"}, {"bash, zsh or fish", "Exit status"}},
       {{"demo"}, {"temporary folder"}},

@@ -23,6 +23,7 @@ void declareSync(CommandSyntax& program, Workspace& workspace);
 void declareRecords(CommandSyntax& program, Workspace& workspace);
 void declareVocabulary(CommandSyntax& program, Workspace& workspace);
 void declarePreferences(CommandSyntax& program, Workspace& workspace);
+void declareExplain(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
 void declareDoctor(CommandSyntax& program, Workspace& workspace);

@@ -53,10 +53,8 @@ std::string effectOfBuild(const NDLogThreshold& threshold) {
 }
 
 std::string effectOfHomes(HomePlatform& platform) {
-  const auto reading = platform.preferences()->booleanForKey_domain_container(
-      Preferences::kHomesConfigured, Preferences::kDomain, platform.homeConfigurationPath());
-  return reading.value ? "commands and syncs look for the homes"
-                       : "commands and syncs find nothing, whatever homes there are";
+  return areHomesConfigured(platform) ? "commands and syncs look for the homes"
+                                      : "commands and syncs find nothing, whatever homes there are";
 }
 
 std::string effectOf(const PreferenceKey& key, HomePlatform& platform,
@@ -67,6 +65,13 @@ std::string effectOf(const PreferenceKey& key, HomePlatform& platform,
 }
 
 }  // namespace
+
+bool areHomesConfigured(HomePlatform& platform) {
+  return platform.preferences()
+      ->booleanForKey_domain_container(Preferences::kHomesConfigured, Preferences::kDomain,
+                                       platform.homeConfigurationPath())
+      .value;
+}
 
 PreferenceReport reportOn(const PreferenceKey& key, HomePlatform& platform,
                           const NDLogThreshold& threshold) {

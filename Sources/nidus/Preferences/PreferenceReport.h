@@ -9,6 +9,9 @@
 
 namespace nidus {
 
+/// Whether the plug-in looks for the homes of `platform`.
+[[nodiscard]] bool areHomesConfigured(HomePlatform& platform);
+
 /// What is told about one preference.
 struct PreferenceReport {
   std::string name;
