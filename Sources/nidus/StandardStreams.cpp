@@ -2,6 +2,7 @@
 
 #include <unistd.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstddef>
 #include <system_error>
@@ -35,13 +36,9 @@ std::string onOneLine(std::string_view text) {
   std::string line;
   while (!text.empty()) {
     const std::size_t control = controlSize(text);
-    const std::size_t size = control == 0 ? 1 : control;
-    if (control == 0) {
-      line += text[0];
-    } else {
-      line += escapeOf(text.substr(0, size));
-    }
-    text.remove_prefix(size);
+    const std::string_view next = text.substr(0, std::max<std::size_t>(control, 1));
+    line += control == 0 ? std::string(next) : escapeOf(next);
+    text.remove_prefix(next.size());
   }
   return line;
 }

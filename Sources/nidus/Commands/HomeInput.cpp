@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <filesystem>
 #include <iostream>
+#include <iterator>
 #include <streambuf>
 #include <system_error>
 
@@ -26,7 +27,7 @@ class CountingBuffer final : public std::streambuf {
 
  protected:
   int_type underflow() override {
-    const std::streamsize size = source_.sgetn(block_.data(), block_.size());
+    const std::streamsize size = source_.sgetn(block_.data(), std::ssize(block_));
     if (size <= 0) return traits_type::eof();
     readBytes_ += static_cast<std::size_t>(size);
     progress_.reach(readBytes_);

@@ -77,6 +77,7 @@ std::string TextTable::text(const TerminalStyle& style) const {
   if (rows_.empty()) return {};
   const std::vector<std::size_t> columns = columnsInUse();
   std::vector<std::size_t> widths;
+  widths.reserve(columns.size());
   for (const std::size_t column : columns) widths.push_back(widthOf(column));
   fit(widths, style.columns);
   TextLine titles(style);
