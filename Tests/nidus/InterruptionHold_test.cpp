@@ -11,12 +11,18 @@ namespace {
 using ::testing::ExitedWithCode;
 using ::testing::KilledBySignal;
 
+/// Lets the signals do what they do by default, whatever the one who started the tests ignores.
+void heedSignals() {
+  for (const int signal : {SIGINT, SIGTERM, SIGHUP}) std::signal(signal, SIG_DFL);
+}
+
 void say(const char* text) { std::cerr << text << std::flush; }
 
 TEST(InterruptionHoldTest, LetsTheWorkEndFirst) {
   for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
     EXPECT_EXIT(
         {
+          heedSignals();
           const InterruptionHold hold;
           std::raise(signal);
           say("done");
@@ -28,6 +34,7 @@ TEST(InterruptionHoldTest, LetsTheWorkEndFirst) {
 TEST(InterruptionHoldTest, YieldsToASecondInterruption) {
   EXPECT_EXIT(
       {
+        heedSignals();
         const InterruptionHold hold;
         std::raise(SIGINT);
         say("once");
@@ -40,6 +47,7 @@ TEST(InterruptionHoldTest, YieldsToASecondInterruption) {
 TEST(InterruptionHoldTest, LetsTheOuterHoldEndFirst) {
   EXPECT_EXIT(
       {
+        heedSignals();
         const InterruptionHold outer;
         {
           const InterruptionHold inner;
@@ -54,6 +62,7 @@ TEST(InterruptionHoldTest, LetsTheOuterHoldEndFirst) {
 TEST(InterruptionHoldTest, HoldsNothingAfterItsEnd) {
   EXPECT_EXIT(
       {
+        heedSignals();
         std::optional<InterruptionHold> hold(std::in_place);
         hold.reset();
         say("released");
