@@ -24,6 +24,12 @@ constexpr const char kFirstHelp[] =
     "nidus COMMAND --help\n\n"
     "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform failed.";
 
+/// The check of a value: an empty one, as a script passes by mistake, must not count as none, and
+/// so turn an order for one room into one for all of the home.
+std::string refuseEmpty(const std::string& value) {
+  return value.empty() ? "the value is empty" : "";
+}
+
 /// Declares a command to the parser of arguments.
 class ParserSyntax final : public CommandSyntax {
  public:
@@ -46,7 +52,7 @@ class ParserSyntax final : public CommandSyntax {
   }
   void option(const std::string& name, const std::string& value, std::string& target,
               const std::string& help) override {
-    app_.add_option(name, target, help)->option_text(value);
+    app_.add_option(name, target, help)->option_text(value)->check(refuseEmpty);
   }
   void requiredOption(const std::string& name, const std::string& value, std::string& target,
                       const std::string& help) override {

@@ -155,6 +155,14 @@ TEST_F(OrdersTest, ChangesNothingForABadOrder) {
   EXPECT_EQ(exported(), before);
 }
 
+TEST_F(OrdersTest, RefusesAnEmptyNameOfARoom) {
+  const std::string before = exported();
+  const ProgramEnd end = run({"set", "power", "off", "--room", ""});
+  EXPECT_EQ(end.exitStatus, 2);
+  EXPECT_THAT(end.errors, IsOneFailure("--room: the value is empty"));
+  EXPECT_EQ(exported(), before);
+}
+
 TEST_F(OrdersTest, SuggestsTheWordThatWasMeant) {
   EXPECT_EQ(run({"get", "BRIGTNESS"}).errors, "nidus: BRIGTNESS: did you mean BRIGHTNESS?\n");
 }

@@ -19,7 +19,8 @@ constexpr const char kValues[] =
     "unmuted, for what can be); 40, 40%, 21.5C, 70F; a word of the attribute, such as heat.";
 
 constexpr const char kStatuses[] =
-    "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform failed.";
+    "Exit status: 0 success, even when single objects failed, 1 any other outcome, 2 bad input,\n"
+    "3 no reply, 4 the platform failed.";
 
 /// What is given to one order on the command line.
 struct OrderInput {
@@ -37,7 +38,7 @@ ExitStatus runOrder(const OrderInput& input, Workspace& workspace) {
   OrderWords words = input.words;
   if (!input.attribute.empty()) words.words.push_back(input.attribute);
   words.words.insert(words.words.end(), input.more.begin(), input.more.end());
-  const auto session = workspace.assistant();
+  const auto session = workspace.home();
   if (!session) return report(session.failure());
   return answerOrder(**session, words,
                      input.isJson    ? AnswerForm::json

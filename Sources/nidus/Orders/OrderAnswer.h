@@ -14,7 +14,7 @@ enum class AnswerForm {
 };
 
 /// Reads and performs an order and shows its answer on standard output; a failure, and silence, are
-/// reported. The module is open.
+/// reported.
 ExitStatus answerOrder(Session& session, const OrderWords& words, AnswerForm form);
 
 }  // namespace nidus

@@ -99,8 +99,8 @@ Result<VAHAValueRef> OrderValueReader::read(const std::string& text,
   }
   auto value = isBoolean ? booleanValue(text, entry) : readNumber(text, entry, use);
   if (value) return value;
-  return Failure{Failure::Kind::badInput,
-                 text + ": " + entry.assistantName.str() + " takes " + expectationOf(entry)};
+  return Failure{Failure::Kind::badInput, shownWord(text) + ": " + entry.assistantName.str() +
+                                              " takes " + expectationOf(entry)};
 }
 
 VAHAValueRef OrderValueReader::ofLimit(const NDValueRef& number,

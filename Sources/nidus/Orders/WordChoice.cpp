@@ -20,6 +20,8 @@ std::string vocabularyWord(std::string_view word) {
   return written;
 }
 
+std::string shownWord(const std::string& word) { return word.empty() ? "\"\"" : word; }
+
 const std::string_view* findWord(std::string_view word,
                                  const std::vector<std::string_view>& known) {
   auto found = std::find(known.begin(), known.end(), word);
@@ -36,7 +38,8 @@ Failure unknownWord(const std::string& word, const std::vector<std::string_view>
                     const std::string& otherwise) {
   const std::string_view meant = nearMiss(vocabularyWord(word), known);
   return {Failure::Kind::badInput,
-          word + ": " + (meant.empty() ? otherwise : "did you mean " + std::string(meant) + "?")};
+          shownWord(word) + ": " +
+              (meant.empty() ? otherwise : "did you mean " + std::string(meant) + "?")};
 }
 
 Result<std::string> chooseWord(const std::string& word, const std::vector<std::string_view>& known,

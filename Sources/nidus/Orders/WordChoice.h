@@ -11,6 +11,9 @@ namespace nidus {
 /// A word as the vocabulary writes its own: "air purifier" and "air-purifier" are "AIR_PURIFIER".
 [[nodiscard]] std::string vocabularyWord(std::string_view word);
 
+/// A person's word as it begins a message: itself, or two quotation marks for the empty one.
+[[nodiscard]] std::string shownWord(const std::string& word);
+
 /// Gives the one of `known` that `word` is, or is apart from its writing; null when it is none.
 [[nodiscard]] const std::string_view* findWord(std::string_view word,
                                                const std::vector<std::string_view>& known);
@@ -20,7 +23,7 @@ namespace nidus {
                                   const std::vector<std::string_view>& known,
                                   const std::string& otherwise);
 
-/// The same as one: the word of `known`, or the failure.
+/// Both in one: the word of `known`, or the failure.
 [[nodiscard]] Result<std::string> chooseWord(const std::string& word,
                                              const std::vector<std::string_view>& known,
                                              const std::string& otherwise);

@@ -135,5 +135,18 @@ TEST(OrderReaderTest, RefusesUnknownTypes) {
   });
 }
 
+TEST(OrderReaderTest, ShowsAnEmptyWord) {
+  OrderWords words;
+  words.verb = "set";
+  words.words = {""};
+  const auto withoutAttribute = readOrder(words, builtInVocabulary(), true);
+  ASSERT_FALSE(withoutAttribute);
+  EXPECT_EQ(withoutAttribute.failure().message.find("\"\": there is no such attribute"), 0U);
+  words.words = {"power", ""};
+  const auto withoutValue = readOrder(words, builtInVocabulary(), true);
+  ASSERT_FALSE(withoutValue);
+  EXPECT_EQ(withoutValue.failure().message.find("\"\": POWER takes on or off"), 0U);
+}
+
 }  // namespace
 }  // namespace nidus
