@@ -115,6 +115,43 @@ TEST_F(HomeEditTest, PrefersVISUAL) {
   EXPECT_THAT(exported(), HasSubstr("\"Den\""));
 }
 
+/// Edits that find no programs but the shell's and those that are put into their folder.
+class HomeEditWithoutProgramsTest : public HomeEditTest {
+ protected:
+  void SetUp() override {
+    HomeEditTest::SetUp();
+    std::filesystem::create_directory(folder_.path() / "bin");
+    for (const std::string name : {"sh", "sed"}) {
+      std::filesystem::create_symlink("/bin/" + name, folder_.path() / "bin" / name);
+    }
+  }
+
+  /// An edit that finds `name` as an editor that renames a room.
+  [[nodiscard]] ProgramEnd editWith(const std::string& name) const {
+    const auto file = folder_.write("bin/" + name, std::string("#!/bin/sh\n") + kRename + '\n');
+    std::filesystem::permissions(file, std::filesystem::perms(0700));
+    ProgramStart edit = editing("", true);
+    edit.environment["EDITOR"] = "";
+    edit.environment["PATH"] = folder_.file("bin");
+    return runProgram(edit);
+  }
+};
+
+TEST_F(HomeEditWithoutProgramsTest, TakesTheEditorOfTheMachine) {
+  for (const char* name : {"vi", "editor"}) {
+    import(sampleDocument());
+    EXPECT_EQ(editWith(name).exitStatus, 0) << name;
+    EXPECT_THAT(exported(), HasSubstr("\"Den\"")) << name;
+    folder_.write("bin/vi", "");
+  }
+}
+
+TEST_F(HomeEditWithoutProgramsTest, ShowsTheSummaryWithoutDiff) {
+  const ProgramEnd end = editWith("vi");
+  EXPECT_EQ(end.exitStatus, 0) << end.errors;
+  EXPECT_EQ(end.output, "1 room renamed\nimported\n");
+}
+
 TEST_F(HomeEditTest, KeepsValuesThatWereSetMeanwhile) {
   const std::string order =
       R"({"filter": {"search": {"serviceName": "Lamp"}}, "actions": [{"actionType": "SET",)"

@@ -142,11 +142,13 @@ std::string withHome(const std::vector<HomeData>& homes, ObjectKind kind,
 
 Failure ambiguity(const std::vector<HomeData>& homes, const ObjectWords& words,
                   const std::vector<ObjectPlace>& found) {
+  constexpr std::size_t kMost = 8;
   std::string list;
-  for (const ObjectPlace& place : found) {
-    list += (list.empty() ? "" : ", ") + withHome(homes, words.kind, place) + " (" +
-            identityAt(homes, words.kind, place) + ')';
+  for (std::size_t i = 0; i < std::min(found.size(), kMost); ++i) {
+    list += (list.empty() ? "" : ", ") + withHome(homes, words.kind, found[i]) + " (" +
+            identityAt(homes, words.kind, found[i]) + ')';
   }
+  if (found.size() > kMost) list += " and " + std::to_string(found.size() - kMost) + " more";
   return badInput("there are " + counted(found.size(), words.kind) + " named " + words.name + ": " +
                   list + "; say which by what stands in brackets" +
                   (words.kind == ObjectKind::home ? "" : ", or its home with --home"));

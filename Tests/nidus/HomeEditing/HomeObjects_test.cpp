@@ -58,6 +58,16 @@ TEST(FindObjectTest, ListsAllOfOneName) {
                     IsBadInput(std::string(kCeilingLampID) + "/8")));
 }
 
+TEST(FindObjectTest, ListsNoMoreThanAPersonReads) {
+  auto homes = sampleHomes();
+  for (RoomData room : std::vector(9, homes[1].rooms[0])) {
+    room.uuid = NDUUID::random();
+    homes[1].rooms.push_back(room);
+  }
+  const auto place = findObject(homes, {ObjectKind::room, "Kitchen", ""});
+  EXPECT_THAT(place, AllOf(IsBadInput("there are 11 rooms"), IsBadInput(" and 3 more; say which")));
+}
+
 TEST(FindObjectTest, DoesNotOfferHomeForHomes) {
   auto homes = sampleHomes();
   homes[1].name = "Beach House";
