@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <compare>
 #include <limits>
 #include <set>
 #include <string_view>
@@ -78,7 +79,7 @@ std::vector<NDValueRef> platformValues(const CharacteristicEntry& entry, bool is
   return values;
 }
 
-bool isBelow(const NDValueRef& a, const NDValueRef& b) { return a->compare(b) < 0; }
+bool isBelow(const NDValueRef& a, const NDValueRef& b) { return std::is_lt(a->compare(b)); }
 
 /// The metadata for values that stand for words: numbers of one byte where they fit.
 MetadataData metadataOf(const std::vector<NDValueRef>& values) {

@@ -1,6 +1,7 @@
 #include "nidus/HomeEditing/SceneAction.h"
 
 #include <algorithm>
+#include <compare>
 
 #include "HomePlatform/Store/ValueConversion.h"
 #include "PlatformModel/Home/NDCharacteristicConstants.h"
@@ -74,8 +75,8 @@ Result<NDValueRef> valueOf(const std::string& text, CharacteristicEntry entry,
   if (!value) return value.failure();
   NDValueRef converted = convertToFormat(platformValue(entry, boxed(**value)), metadata.format);
   if (!converted) return badInput(text + ": this accessory does not take it; see nidus home show");
-  const bool isOutside = converted->compare(metadata.minimumValue) < 0 ||
-                         converted->compare(metadata.maximumValue) > 0;
+  const bool isOutside = std::is_lt(converted->compare(metadata.minimumValue)) ||
+                         std::is_gt(converted->compare(metadata.maximumValue));
   if (!isOutside) return converted;
   return badInput(text + ": " + entry.assistantName.str() + " goes from " +
                   description(metadata.minimumValue) + " to " + description(metadata.maximumValue) +

@@ -86,6 +86,13 @@ Status mergeRandomHome(HomeStore& store) {
   return store.mergeHomes({changed, RandomHome(4).home()});
 }
 
+Status renameTheHome(HomeStore& store) {
+  return store.editHomes([](std::vector<HomeData>& homes) {
+    homes.at(0).name = "Renamed";
+    return Status();
+  });
+}
+
 Status writeTwoValues(HomeStore& store) {
   const NDUUID home = uuidOf(kHomeID);
   const NDValueRef brightness = NDValue::integer(13);
@@ -145,6 +152,7 @@ const Change kChanges[] = {
     {"firstImport", nullptr, withStore(importRandomHomes)},
     {"import", beginWithHome, withStore(importRandomHomes)},
     {"merge", beginWithHome, withStore(mergeRandomHome)},
+    {"edit", beginWithHome, withStore(renameTheHome)},
     {"write", beginWithHome, withStore(writeTwoValues)},
     {"scene", beginWithHome, runScene},
     {"migration", beginWithHome, migrate, migratedContents},
