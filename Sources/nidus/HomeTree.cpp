@@ -37,74 +37,37 @@ std::string namesOf(const std::vector<Object>& objects) {
   return joined(names);
 }
 
-std::string symbolOf(const NDString& unit) {
-  struct Symbol {
-    const char* unit;
-    const char* text;
-  };
-  constexpr Symbol kSymbols[] = {
-      {"percentage", " %"}, {"celsius", " °C"}, {"fahrenheit", " °F"}, {"arcdegrees", "°"}};
-  if (!unit) return {};
-  for (const Symbol& symbol : kSymbols) {
-    if (unit == symbol.unit) return symbol.text;
-  }
-  return ' ' + unit.str();
-}
-
-/// The attribute that commands use for a characteristic; what is only written is its target.
-std::string attributeOf(const NDString& type, const NDNAPMetadata& metadata) {
-  const NDString name = metadata.mapToAssistantCharacteristicName(type);
-  if (!name) return type.str();
-  const NDString readType = metadata.mapReadCharcteristicFromAssistantName(name);
-  return !readType || readType == type ? name.str() : name.str() + " target";
-}
-
-std::string valueOf(const CharacteristicData& data, const NDNAPMetadata& metadata) {
-  if (!data.value) return "unknown";
-  const NDString& type = data.characteristicType;
-  const NDValueRef value = metadata.mapToAssistantCharacteristicValue_name(data.value, type);
-  if (value->isBoolean()) return value->boolValue() ? "true" : "false";
-  const bool hasUnit = data.metadata && data.metadata->units;
-  const NDString unit = hasUnit ? data.metadata->units : metadata.characteristicValueUnit(type);
-  return value->description() + (value->isNumber() ? symbolOf(unit) : "");
-}
-
-std::string typeOf(const NDString& type, const NDNAPMetadata& metadata) {
-  const NDString name = metadata.mapToAssistantServiceName(type);
-  return name ? name.str() : type.str();
-}
-
-Branch serviceBranch(const ServiceData& service, const NDNAPMetadata& metadata) {
+Branch serviceBranch(const ServiceData& service, const HomeWords& words) {
   std::string text = (service.name ? service.name.str() : "(no name)") + " [" +
-                     typeOf(service.serviceType, metadata);
+                     words.serviceTypeOf(service.serviceType);
   if (service.associatedServiceType) {
-    text += " as " + typeOf(service.associatedServiceType, metadata);
+    text += " as " + words.serviceTypeOf(service.associatedServiceType);
   }
   std::vector<std::string> values;
   for (const CharacteristicData& characteristic : service.characteristics) {
-    values.push_back(attributeOf(characteristic.characteristicType, metadata) + ' ' +
-                     valueOf(characteristic, metadata));
+    values.push_back(words.attributeOf(characteristic.characteristicType) + ' ' +
+                     words.valueOf(characteristic, characteristic.value));
   }
   return {text + (values.empty() ? "]" : "] " + joined(values)), {}};
 }
 
-Branch accessoryBranch(const AccessoryData& accessory, const NDNAPMetadata& metadata) {
+Branch accessoryBranch(const AccessoryData& accessory, const HomeWords& words) {
   std::vector<std::string> notes;
   if (!accessory.reachable) notes.emplace_back("unreachable");
   if (accessory.requiresUnlock) notes.emplace_back("requires an unlocked device");
   Branch branch{accessory.name.str() + (notes.empty() ? "" : " (" + joined(notes) + ')'), {}};
   for (const ServiceData& service : accessory.services) {
-    branch.below.push_back(serviceBranch(service, metadata));
+    branch.below.push_back(serviceBranch(service, words));
   }
   return branch;
 }
 
 /// The accessories that stand in `room`, or in no room for none.
 Branch roomBranch(const std::string& name, const std::optional<NDUUID>& room, const HomeData& home,
-                  const NDNAPMetadata& metadata) {
+                  const HomeWords& words) {
   Branch branch{name, {}};
   for (const AccessoryData& accessory : home.accessories) {
-    if (accessory.room == room) branch.below.push_back(accessoryBranch(accessory, metadata));
+    if (accessory.room == room) branch.below.push_back(accessoryBranch(accessory, words));
   }
   return branch;
 }
@@ -151,12 +114,12 @@ void addList(std::vector<Branch>& branches, const std::string& title,
 
 }  // namespace
 
-std::string homeTree(const HomeData& home, const NDNAPMetadata& metadata) {
+std::string homeTree(const HomeData& home, const HomeWords& words) {
   std::vector<Branch> branches;
   for (const RoomData& room : home.rooms) {
-    branches.push_back(roomBranch(room.name.str(), room.uuid, home, metadata));
+    branches.push_back(roomBranch(room.name.str(), room.uuid, home, words));
   }
-  Branch roomless = roomBranch("in no room", std::nullopt, home, metadata);
+  Branch roomless = roomBranch("in no room", std::nullopt, home, words);
   if (!roomless.below.empty()) branches.push_back(std::move(roomless));
   addList(branches, "zones", home.zones, zoneText, home);
   addList(branches, "groups", home.serviceGroups, groupText, home);

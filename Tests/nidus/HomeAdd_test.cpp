@@ -38,7 +38,7 @@ TEST_F(HomeAddTest, BuildsAHomeFromNothing) {
             "Beach House (primary)\n"
             "├─ Study\n"
             "│  └─ Floor lamp\n"
-            "│     └─ Lamp [LIGHT] POWER false, BRIGHTNESS 0 %\n"
+            "│     └─ Lamp [LIGHT] POWER off, BRIGHTNESS 0 %\n"
             "├─ Hall\n"
             "├─ zones\n"
             "│  └─ All: Study, Hall\n"
@@ -47,7 +47,7 @@ TEST_F(HomeAddTest, BuildsAHomeFromNothing) {
             "├─ scenes: Dusk\n"
             "└─ triggers: Noon\n");
   EXPECT_EQ(run({"run", "Dusk"}).exitStatus, 0);
-  EXPECT_THAT(run({"home", "show"}).output, HasSubstr("POWER true, BRIGHTNESS 20 %"));
+  EXPECT_THAT(run({"home", "show"}).output, HasSubstr("POWER on, BRIGHTNESS 20 %"));
 }
 
 TEST_F(HomeAddTest, WritesADocumentThatCanBeImported) {

@@ -103,12 +103,12 @@ TEST_F(HomeCommandTest, ShowsATree) {
             "Cottage (primary)\n"
             "├─ Kitchen\n"
             "│  ├─ Lamp\n"
-            "│  │  └─ Lamp [LIGHT] POWER true, BRIGHTNESS 40 %\n"
+            "│  │  └─ Lamp [LIGHT] POWER on, BRIGHTNESS 40 %\n"
             "│  └─ Away (unreachable)\n"
-            "│     └─ Away [LIGHT] POWER true, BRIGHTNESS 40 %\n"
+            "│     └─ Away [LIGHT] POWER on, BRIGHTNESS 40 %\n"
             "├─ in no room\n"
             "│  └─ Door (requires an unlocked device)\n"
-            "│     └─ Door [LOCK] POWER false\n"
+            "│     └─ Door [LOCK] POWER off\n"
             "├─ zones\n"
             "│  └─ Downstairs: Kitchen\n"
             "├─ groups\n"
@@ -119,7 +119,7 @@ TEST_F(HomeCommandTest, ShowsATree) {
 TEST_F(HomeCommandTest, ShowsNewValues) {
   importSmallHome();
   EXPECT_EQ(run({"perform"}, setCommandLine("Lamp", false)).exitStatus, 0);
-  EXPECT_THAT(run({"home", "show"}).output, HasSubstr("Lamp [LIGHT] POWER false"));
+  EXPECT_THAT(run({"home", "show"}).output, HasSubstr("Lamp [LIGHT] POWER off"));
 }
 
 TEST_F(HomeCommandTest, SaysThatThereAreNoHomes) {

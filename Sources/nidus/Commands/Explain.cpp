@@ -79,6 +79,10 @@ void declareExplain(CommandSyntax& program, Workspace& workspace) {
       "Exit status: 0 explained, whatever the answer would be; 2 bad input, 4 the platform "
       "failed.");
   syntax.optionalArguments("ORDER", input->words.words, "An order, as it is given to nidus");
+  syntax.candidates("ORDER", {Candidates(std::vector<std::string>{"get", "set", "raise", "lower",
+                                                                  "toggle", "limits", "run"}),
+                              {CandidateKind::attributes},
+                              {CandidateKind::values}});
   declareFilterOptions(syntax, input->words.filter);
   syntax.flag("--target", input->words.asksTarget, "With get: the value that was set");
   syntax.option("--command", "COMMAND", input->command,

@@ -14,9 +14,9 @@ ExitStatus showHomes(Workspace& workspace) {
   const auto homes = platform.exportHomes();
   if (!homes) return report(homes.failure());
   if (homes->empty()) return printText("no homes yet; import some with nidus home import FILE\n");
-  const auto metadata = platform.metadata();
+  const HomeWords words(platform);
   std::string text;
-  for (const HomeData& home : *homes) text += homeTree(home, *metadata);
+  for (const HomeData& home : *homes) text += homeTree(home, words);
   return printText(text);
 }
 

@@ -134,17 +134,17 @@ class PreferenceCommands {
     list.syntax.flag("--json", list.input.isJson, "Print one JSON object");
     Below get = declare("get", "Tells one preference and what it does now",
                         "Example: nidus preferences get NidusLogLevel", getPreference);
-    get.syntax.requiredArgument("KEY", get.input.key, "The preference");
+    declareKey(get);
     get.syntax.flag("--json", get.input.isJson, "Print one JSON object");
     Below set = declare("set", "Sets a preference",
                         "Example: log everything\n  nidus preferences set NidusLogLevel debug",
                         setPreference);
-    set.syntax.requiredArgument("KEY", set.input.key, "The preference");
+    declareKey(set);
     set.syntax.requiredArgument("VALUE", set.input.value,
                                 "true or false (or yes, no); a log level or its name");
     Below unset = declare("unset", "Removes a preference, so that its default counts",
                           "Example: nidus preferences unset NidusLogLevel", unsetPreference);
-    unset.syntax.requiredArgument("KEY", unset.input.key, "The preference");
+    declareKey(unset);
   }
 
  private:
@@ -160,6 +160,13 @@ class PreferenceCommands {
     CommandSyntax& syntax = preferences_.command(name, help, std::string(details) + kStatuses);
     syntax.run([input, action, &workspace = workspace_] { return action(*input, workspace); });
     return {syntax, *input};
+  }
+
+  static void declareKey(const Below& below) {
+    std::vector<std::string> names;
+    for (const PreferenceKey& key : preferenceKeys()) names.emplace_back(key.name);
+    below.syntax.requiredArgument("KEY", below.input.key, "The preference");
+    below.syntax.candidates("KEY", {Candidates(std::move(names))});
   }
 
   CommandSyntax& preferences_;

@@ -16,8 +16,7 @@ constexpr const char kKnown[] = "KNOWN LAST";
 /// Puts the explanation of an action together.
 class ActionTelling {
  public:
-  ActionTelling(const HomeIndex& before, const CharacteristicText& words,
-                const TerminalStyle& style)
+  ActionTelling(const HomeIndex& before, const HomeWords& words, const TerminalStyle& style)
       : before_(before), words_(words), style_(style) {}
 
   [[nodiscard]] std::string reached(const Rehearsal& rehearsal) const {
@@ -125,14 +124,14 @@ class ActionTelling {
   }
 
   const HomeIndex& before_;
-  const CharacteristicText& words_;
+  const HomeWords& words_;
   const TerminalStyle& style_;
 };
 
 }  // namespace
 
-std::string actionText(const Rehearsal& rehearsal, const HomeIndex& before,
-                       const CharacteristicText& words, const TerminalStyle& style) {
+std::string actionText(const Rehearsal& rehearsal, const HomeIndex& before, const HomeWords& words,
+                       const TerminalStyle& style) {
   const ActionTelling telling(before, words, style);
   std::string text = rehearsal.reached.empty() ? "" : telling.reached(rehearsal);
   for (const PlatformCall& call : rehearsal.calls) {

@@ -3,9 +3,9 @@
 #include <string>
 
 #include "PlatformModel/Assistant/VAHACommand.h"
-#include "nidus/CharacteristicText.h"
 #include "nidus/Explain/HomeIndex.h"
 #include "nidus/Explain/Rehearsal.h"
+#include "nidus/HomeWords.h"
 #include "nidus/Terminal/Terminal.h"
 
 namespace nidus {
@@ -13,6 +13,6 @@ namespace nidus {
 /// Tells people what the action of a rehearsed command reaches, what it would read, write or run,
 /// and which values would be others afterwards. `before` are the homes as they were copied.
 [[nodiscard]] std::string actionText(const Rehearsal& rehearsal, const HomeIndex& before,
-                                     const CharacteristicText& words, const TerminalStyle& style);
+                                     const HomeWords& words, const TerminalStyle& style);
 
 }  // namespace nidus

@@ -7,12 +7,12 @@
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "nidus/Answers/Answer.h"
 #include "nidus/Answers/ReplyForm.h"
-#include "nidus/CharacteristicText.h"
 #include "nidus/Explain/ActionText.h"
 #include "nidus/Explain/FilterText.h"
 #include "nidus/Explain/HomeIndex.h"
 #include "nidus/Explain/Judgement.h"
 #include "nidus/Explain/NameHint.h"
+#include "nidus/HomeWords.h"
 
 namespace nidus {
 namespace {
@@ -66,7 +66,7 @@ std::string wholeActionText(const VAHACommand& command, const Rehearsal& rehears
   if (keptBy(rehearsal).empty()) return "There is nothing to act on.\n";
   HomePlatform& platform = stage.platform();
   return unreachedText(command, rehearsal, *platform.metadata()) +
-         actionText(rehearsal, HomeIndex(stage.homes()), CharacteristicText(platform), style);
+         actionText(rehearsal, HomeIndex(stage.homes()), HomeWords(platform), style);
 }
 
 bool isNoMatch(const NDDictionary& reply) {

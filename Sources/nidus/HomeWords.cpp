@@ -1,4 +1,4 @@
-#include "nidus/CharacteristicText.h"
+#include "nidus/HomeWords.h"
 
 #include "nidus/Answers/ValueText.h"
 
@@ -18,18 +18,23 @@ NDDictionary dictionaryOf(const NDValue& value, const NDString& unit) {
 
 }  // namespace
 
-CharacteristicText::CharacteristicText(HomePlatform& platform)
+HomeWords::HomeWords(HomePlatform& platform)
     : vocabulary_(platform.vocabulary()), metadata_(platform.metadata()) {}
 
-std::string CharacteristicText::attributeOf(const NDString& type) const {
+std::string HomeWords::serviceTypeOf(const NDString& type) const {
+  const NDString name = metadata_->mapToAssistantServiceName(type);
+  return name ? name.str() : type.str();
+}
+
+std::string HomeWords::attributeOf(const NDString& type) const {
   const NDString name = metadata_->mapToAssistantCharacteristicName(type);
   if (!name) return type.str();
   const NDString readType = metadata_->mapReadCharcteristicFromAssistantName(name);
   return !readType || readType == type ? name.str() : name.str() + " target";
 }
 
-std::string CharacteristicText::valueOf(const CharacteristicData& characteristic,
-                                        const NDValueRef& value) const {
+std::string HomeWords::valueOf(const CharacteristicData& characteristic,
+                               const NDValueRef& value) const {
   if (!value) return "unknown";
   const NDString& type = characteristic.characteristicType;
   const bool hasUnit = characteristic.metadata && characteristic.metadata->units;
@@ -40,7 +45,7 @@ std::string CharacteristicText::valueOf(const CharacteristicData& characteristic
   return valueText(dictionaryOf(*shown, unit), name.view(), vocabulary_);
 }
 
-std::string CharacteristicText::limitsOf(const CharacteristicData& characteristic) const {
+std::string HomeWords::limitsOf(const CharacteristicData& characteristic) const {
   if (!characteristic.metadata) return {};
   const NDValueRef& minimum = characteristic.metadata->minimumValue;
   const NDValueRef& maximum = characteristic.metadata->maximumValue;

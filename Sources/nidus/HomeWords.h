@@ -7,16 +7,18 @@
 
 namespace nidus {
 
-/// Says what characteristics are and have, in the words of orders and answers.
+/// Says what services and characteristics are and have, in the words of orders and answers.
 ///
-///     const CharacteristicText text(platform);
-///     text.attributeOf(lamp.characteristicType);  // "BRIGHTNESS"
-///     text.valueOf(lamp, lamp.value);             // "65 %"
-class CharacteristicText {
+///     const HomeWords words(platform);
+///     words.attributeOf(lamp.characteristicType);  // "BRIGHTNESS"
+///     words.valueOf(lamp, lamp.value);             // "65 %"
+class HomeWords {
  public:
   /// `platform` must outlive this.
-  explicit CharacteristicText(HomePlatform& platform);
+  explicit HomeWords(HomePlatform& platform);
 
+  /// The type of a service; one that the vocabulary does not have is given as it is.
+  [[nodiscard]] std::string serviceTypeOf(const NDString& type) const;
   /// The attribute of a characteristic type; what is only written is its target. A type that the
   /// vocabulary does not have is given as it is.
   [[nodiscard]] std::string attributeOf(const NDString& type) const;
