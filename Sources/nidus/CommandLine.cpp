@@ -96,6 +96,15 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
                  "The folder of the homes and preferences (else NIDUS_DATA, else nidus in the "
                  "user's data folder)");
   program.candidates("--data", {{CandidateKind::files}});
+  declareWorkspaceCommands(program, workspace);
+  declareReplay(program);
+  declareDemo(program);
+  declareShell(program, workspace);
+  declareComplete(program, workspace);
+  declareCompletion(program);
+}
+
+void declareWorkspaceCommands(CommandSyntax& program, Workspace& workspace) {
   program.flag("--locked", workspace.settings().isLocked, "The device is locked");
   declareHome(program, workspace);
   declareOrders(program, workspace);
@@ -105,11 +114,7 @@ void declareProgram(CommandSyntax& program, Workspace& workspace) {
   declareVocabulary(program, workspace);
   declarePreferences(program, workspace);
   declareExplain(program, workspace);
-  declareReplay(program);
-  declareDemo(program);
   declareDoctor(program, workspace);
-  declareComplete(program, workspace);
-  declareCompletion(program);
 }
 
 namespace {

@@ -17,6 +17,9 @@ int runCommandLine(int argc, const char* const* argv);
 /// Declares the whole program: the options of all commands and the commands.
 void declareProgram(CommandSyntax& program, Workspace& workspace);
 
+/// Declares the part of it that the shell runs too: what works on the one workspace.
+void declareWorkspaceCommands(CommandSyntax& program, Workspace& workspace);
+
 /// Declares a program, reads `words` (without the program's name) as its arguments, and runs the
 /// command that they give. What is wrong with them is reported.
 ExitStatus runCommand(std::vector<std::string> words,

@@ -13,14 +13,17 @@ std::filesystem::path environment(const char* name) {
 
 }  // namespace
 
+std::filesystem::path userFolder(const char* variable, const char* belowHome) {
+  // A relative one is to be ignored.
+  if (auto folder = environment(variable); folder.is_absolute()) return folder / "nidus";
+  const auto home = environment("HOME");
+  return home.empty() ? home : home / belowHome / "nidus";
+}
+
 Result<std::filesystem::path> dataFolderOf(const Settings& settings) {
   if (!settings.dataFolder.empty()) return std::filesystem::path(settings.dataFolder);
   if (auto folder = environment("NIDUS_DATA"); !folder.empty()) return folder;
-  // A relative one is to be ignored.
-  if (auto folder = environment("XDG_DATA_HOME"); folder.is_absolute()) return folder / "nidus";
-  if (auto folder = environment("HOME"); !folder.empty()) {
-    return folder / ".local" / "share" / "nidus";
-  }
+  if (auto folder = userFolder("XDG_DATA_HOME", ".local/share"); !folder.empty()) return folder;
   return Failure{Failure::Kind::badInput,
                  "no data folder is known; give --data DIR or set NIDUS_DATA or HOME"};
 }

@@ -18,6 +18,10 @@ struct Settings {
 /// in the user's data folder. A failure, as bad input, says that none of them is set.
 [[nodiscard]] Result<std::filesystem::path> dataFolderOf(const Settings& settings);
 
+/// The program's folder for one kind of the user's files: below the folder that the environment
+/// variable names, else below `belowHome` in the home folder; empty when neither is known.
+[[nodiscard]] std::filesystem::path userFolder(const char* variable, const char* belowHome);
+
 /// How to open the platform that `settings` ask for.
 [[nodiscard]] Result<HomePlatformOptions> platformOptionsOf(const Settings& settings);
 

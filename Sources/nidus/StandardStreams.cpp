@@ -6,6 +6,9 @@
 #include <cerrno>
 #include <cstddef>
 #include <system_error>
+#include <utility>
+
+#include "PlatformModel/System/NDMutex.h"
 
 namespace nidus {
 namespace {
@@ -28,6 +31,28 @@ std::string escapeOf(std::string_view bytes) {
     escape.append("\\x").append(1, kDigits[byteOf(c) >> 4U]).append(1, kDigits[byteOf(c) & 15U]);
   }
   return escape;
+}
+
+/// What every line on standard error begins with.
+class Place {
+ public:
+  void set(std::string place) {
+    const NDLock lock(mutex_);
+    place_ = std::move(place);
+  }
+  [[nodiscard]] std::string get() {
+    const NDLock lock(mutex_);
+    return place_;
+  }
+
+ private:
+  NDMutex mutex_;
+  std::string place_ ND_GUARDED_BY(mutex_);
+};
+
+Place& reportPlace() {
+  static Place place;
+  return place;
 }
 
 }  // namespace
@@ -75,7 +100,12 @@ ExitStatus report(const Failure& failure) {
 
 void reportLine(std::string_view message) {
   // Where even this can not be written there is nobody left to tell.
-  static_cast<void>(writeWhole(STDERR_FILENO, "nidus: " + onOneLine(message) + '\n'));
+  static_cast<void>(
+      writeWhole(STDERR_FILENO, "nidus: " + reportPlace().get() + onOneLine(message) + '\n'));
 }
+
+ReportPlace::ReportPlace(std::string place) { reportPlace().set(std::move(place)); }
+
+ReportPlace::~ReportPlace() { reportPlace().set(""); }
 
 }  // namespace nidus

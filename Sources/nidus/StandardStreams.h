@@ -27,4 +27,14 @@ ExitStatus report(const Failure& failure);
 /// Writes one line to standard error.
 void reportLine(std::string_view message);
 
+/// While it lives, the lines on standard error say where the input they are about stands, such as
+/// "line 3: ". One at a time; the lines may come from any thread.
+class ReportPlace {
+ public:
+  explicit ReportPlace(std::string place);
+  ~ReportPlace();
+  ReportPlace(const ReportPlace&) = delete;
+  ReportPlace& operator=(const ReportPlace&) = delete;
+};
+
 }  // namespace nidus

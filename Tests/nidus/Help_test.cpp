@@ -44,6 +44,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"explain"}, {"ORDER", "--command", "--json", "--room", "Exit status"}},
       {{"replay"}, {"SCENARIO"}},
       {{"completion"}, {"bash, zsh or fish", "Exit status"}},
+      {{"shell"}, {"history", "Example", "Exit status"}},
       {{"demo"}, {"temporary folder"}},
       {{"doctor"}, {"--json", "Example", "Exit status"}},
   };

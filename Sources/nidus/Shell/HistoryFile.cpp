@@ -1,0 +1,53 @@
+#include "nidus/Shell/HistoryFile.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <cstddef>
+#include <fstream>
+#include <system_error>
+
+#include "HomePlatform/System/FileDescriptor.h"
+#include "nidus/FileReplacement.h"
+#include "nidus/Settings.h"
+#include "nidus/StandardStreams.h"
+
+namespace nidus {
+
+std::vector<std::string> HistoryFile::lines() const {
+  std::vector<std::string> lines;
+  std::ifstream in(file_);
+  for (std::string line; std::getline(in, line);) lines.push_back(line);
+  if (lines.size() <= kLines) return lines;
+  const bool isLong = lines.size() > 2 * kLines;
+  lines.erase(lines.begin(), lines.end() - static_cast<std::ptrdiff_t>(kLines));
+  if (isLong) {
+    std::string text;
+    for (const std::string& line : lines) text += line + '\n';
+    // A history that could not be cut is as good as before.
+    static_cast<void>(replaceFile(file_, text));
+  }
+  return lines;
+}
+
+Status HistoryFile::add(const std::string& line) const {
+  // What cannot be made here shows when the file is opened.
+  std::error_code ignored;
+  std::filesystem::create_directories(file_.parent_path().parent_path(), ignored);
+  ::mkdir(file_.parent_path().c_str(), S_IRWXU);
+  const FileDescriptor file(
+      ::open(file_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, S_IRUSR | S_IWUSR));
+  if (file && writeWhole(file.get(), line + '\n')) return std::nullopt;
+  return Failure{Failure::Kind::platform, file_.string() + ": the history cannot be written (" +
+                                              std::generic_category().message(errno) +
+                                              "); mend its permissions"};
+}
+
+std::optional<std::filesystem::path> historyPath() {
+  const auto folder = userFolder("XDG_STATE_HOME", ".local/state");
+  if (folder.empty()) return std::nullopt;
+  return folder / "history";
+}
+
+}  // namespace nidus
