@@ -14,11 +14,13 @@ enum class CandidateKind {
   serviceTypes,
   entityTypes,
   homes,
-  rooms,  ///< Of the home that an option names, like the four that follow; else of all homes.
+  rooms,  ///< Of the home that an option names, like all that follow; else of all homes.
   zones,
-  groups,
+  accessories,
   services,
+  groups,
   scenes,
+  triggers,
   files,
 };
 

@@ -10,17 +10,18 @@ Candidates candidatesOf(ObjectKind kind) {
       return {CandidateKind::rooms};
     case ObjectKind::zone:
       return {CandidateKind::zones};
+    case ObjectKind::accessory:
+      return {CandidateKind::accessories};
     case ObjectKind::service:
       return {CandidateKind::services};
     case ObjectKind::group:
       return {CandidateKind::groups};
     case ObjectKind::scene:
       return {CandidateKind::scenes};
-    case ObjectKind::accessory:
     case ObjectKind::trigger:
       break;
   }
-  return {};
+  return {CandidateKind::triggers};
 }
 
 void declareObjectArguments(CommandSyntax& syntax, ObjectWords& words) {

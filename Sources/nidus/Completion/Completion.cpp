@@ -11,8 +11,9 @@ namespace nidus {
 namespace {
 
 constexpr std::string_view kEntityTypes[] = {
-    VAHAEntityTypeHOMEValue, VAHAEntityTypeSERVICEValue, VAHAEntityTypeGROUPValue,
-    VAHAEntityTypeROOMValue, VAHAEntityTypeZONEValue,    VAHAEntityTypeSCENEValue,
+    VAHAEntityTypeHOMEValue,    VAHAEntityTypeSERVICEValue, VAHAEntityTypeGROUPValue,
+    VAHAEntityTypeROOMValue,    VAHAEntityTypeZONEValue,    VAHAEntityTypeSCENEValue,
+    VAHAEntityTypeTRIGGERValue,
 };
 
 char lowerCase(char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; }

@@ -25,8 +25,10 @@ class NamesOfHome {
     add(CandidateKind::homes, home.name);
     addAll(CandidateKind::rooms, home.rooms);
     addAll(CandidateKind::zones, home.zones);
+    addAll(CandidateKind::accessories, home.accessories);
     addAll(CandidateKind::groups, home.serviceGroups);
     addAll(CandidateKind::scenes, home.actionSets);
+    addAll(CandidateKind::triggers, home.triggers);
     for (const AccessoryData& accessory : home.accessories) {
       addAll(CandidateKind::services, accessory.services);
     }

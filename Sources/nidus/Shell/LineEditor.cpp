@@ -65,6 +65,8 @@ class LineEditor::Terminal {
 
   std::optional<std::string> readLine() {
     isDiscarded_ = false;
+    // Before the prompt invites a key that the terminal would still take for a signal or an end.
+    set(EL_PREP_TERM, 1);
     int size = 0;
     const char* read = el_gets(editor_.get(), &size);
     if (isDiscarded_) return "";

@@ -137,6 +137,22 @@ TEST_F(ShellCommandTest, CompletesAtTheTabKey) {
   EXPECT_EQ(terminal.finish().exitStatus, 0);
 }
 
+TEST_F(ShellCommandTest, CompletesARoomWithAnAccentAndASpace) {
+  TerminalProcess terminal(startOnTerminal());
+  ASSERT_TRUE(terminal.waitFor("nidus> "));
+  // Not in this home, and in the one that takes its place.
+  terminal.write("get power --room cafe\t\x15");
+  terminal.write("home import " NIDUS_RESOURCES "/demonstration-home.json\n");
+  ASSERT_TRUE(terminal.waitFor("imported"));
+  ASSERT_TRUE(terminal.waitFor("nidus> "));
+  terminal.write("get power --room cafe\t--type light\n");
+  ASSERT_TRUE(terminal.waitFor(R"(Café\ Corner )"));
+  ASSERT_TRUE(terminal.waitFor("Café Lamp"));
+  ASSERT_TRUE(terminal.waitFor("nidus> "));
+  terminal.write("exit\n");
+  EXPECT_EQ(terminal.finish().exitStatus, 0);
+}
+
 TEST(ShellTest, SaysDurationsForPeople) {
   EXPECT_EQ(durationText(0.41), "0.4 ms");
   EXPECT_EQ(durationText(9.96), "10 ms");
