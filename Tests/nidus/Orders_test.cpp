@@ -207,6 +207,12 @@ TEST_F(OrdersTest, SetsToTheLimitOfTheDevice) {
   }
 }
 
+TEST_F(OrdersTest, SetsToOneLimitByOneCommand) {
+  const std::string replies = replyTo({"set", "color", "temperature", "maximum"});
+  EXPECT_EQ(std::count(replies.begin(), replies.end(), '\n'), 1);
+  EXPECT_THAT(replies, AllOf(HasSubstr("Floor Lamp"), HasSubstr("Desk Lamp"), HasSubstr("500")));
+}
+
 TEST_F(OrdersTest, FindsNoLimitWhereThereIsNone) {
   EXPECT_EQ(run({"set", "brightness", "maximum", "--service", "Kettle"}).exitStatus, 1);
 }
@@ -265,12 +271,21 @@ TEST_F(DifferentLimitsTest, AreSetOneByOne) {
 }
 
 TEST_F(DifferentLimitsTest, NeedNamesToBeToldApart) {
-  importLamps("Lamp", "Lamp");
-  const std::string before = exported();
-  const ProgramEnd end = run({"set", "brightness", "maximum"});
-  EXPECT_EQ(end.exitStatus, 2);
-  EXPECT_THAT(end.errors, IsOneFailure("BRIGHTNESS: the limits of these objects differ"));
-  EXPECT_EQ(exported(), before);
+  for (const char* second : {"Lamp", ""}) {
+    importLamps("Lamp", second);
+    const std::string before = exported();
+    const ProgramEnd end = run({"set", "brightness", "maximum"});
+    EXPECT_EQ(end.exitStatus, 2);
+    EXPECT_THAT(end.errors, IsOneFailure("BRIGHTNESS: the limits of these objects differ"));
+    EXPECT_EQ(exported(), before);
+  }
+}
+
+TEST_F(DifferentLimitsTest, AreToldWithoutAStep) {
+  importLamps("Tall", "Small");
+  const ProgramEnd end = run({"limits", "brightness"});
+  EXPECT_EQ(end.exitStatus, 0);
+  EXPECT_THAT(end.output, AllOf(HasSubstr("100"), HasSubstr("50"), HasSubstr("none")));
 }
 
 using OrderHelpTest = ProgramTest;
