@@ -6,14 +6,19 @@ namespace nidus {
 
 Result<Session*> Workspace::home() {
   if (!session_) {
-    auto options = platformOptionsOf(settings_);
-    if (!options) return options.failure();
-    auto session = Session::open(std::move(*options));
+    auto opened = options();
+    if (!opened) return opened.failure();
+    auto session = Session::open(std::move(*opened));
     if (!session) return session.failure();
     session_ = std::move(*session);
   }
   session_->platform().setLocked(settings_.isLocked);
   return session_.get();
+}
+
+Result<HomePlatformOptions> Workspace::options() const {
+  if (options_) return *options_;
+  return platformOptionsOf(settings_);
 }
 
 Result<Session*> Workspace::assistant() {

@@ -1,6 +1,8 @@
 #pragma once
 
 #include <memory>
+#include <optional>
+#include <utility>
 
 #include "HomePlatform/Result.h"
 #include "nidus/Session.h"
@@ -18,6 +20,10 @@ namespace nidus {
 ///     (*session)->runner().perform(**command);
 class Workspace {
  public:
+  Workspace() = default;
+  /// Works on the platform of these options, whatever folder the settings name.
+  explicit Workspace(HomePlatformOptions options) : options_(std::move(options)) {}
+
   /// What was asked for; read when a command runs.
   [[nodiscard]] Settings& settings() noexcept { return settings_; }
 
@@ -30,6 +36,9 @@ class Workspace {
   void close() { session_.reset(); }
 
  private:
+  [[nodiscard]] Result<HomePlatformOptions> options() const;
+
+  const std::optional<HomePlatformOptions> options_;
   Settings settings_;
   std::unique_ptr<Session> session_;
 };

@@ -1,18 +1,19 @@
 #include <cstddef>
 #include <sstream>
+#include <string>
+#include <utility>
 
-#include "AssistantHost/CommandReader.h"
-#include "AssistantHost/JsonLine.h"
 #include "AssistantHost/SyncClient.h"
 #include "HomePlatform/Store/HomeDocument.h"
+#include "nidus/CommandLine.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/Commands/DemoSteps.h"
 #include "nidus/Commands/HomeInput.h"
-#include "nidus/InterruptionHold.h"
-#include "nidus/Session.h"
+#include "nidus/Shell/Shell.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/TemporaryFolder.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 
@@ -21,19 +22,34 @@ extern const std::string_view kDemonstrationHome;
 
 namespace {
 
-/// Shows what the plug-in can do and compares it with what it should do.
-class Demonstration {
- public:
-  explicit Demonstration(Session& session) : session_(session) {}
+constexpr const char kEnd[] =
+    "\nWhat to try next: begin with a home of your own to play with, and talk to it.\n"
+    "  nidus demo --home > home.json          the home of this tour, as a document\n"
+    "  nidus home import home.json\n"
+    "  nidus shell                            the same orders, line by line\n"
+    "  nidus vocabulary                       the words of orders\n"
+    "  nidus explain set brightness 40%       what an order would do\n"
+    "  nidus doctor                           what is wrong with the home\n"
+    "  nidus --help                           everything else\n";
 
-  /// Imports the demonstration home, synchronises and performs all commands.
+std::string heading(std::string_view title) { return "\n# " + std::string(title) + '\n'; }
+
+/// Leads through what the plug-in can do, on a home of its own.
+class Tour {
+ public:
+  explicit Tour(Workspace& workspace)
+      : workspace_(workspace), shell_(workspace, [&workspace](CommandSyntax& program) {
+          declareWorkspaceCommands(program, workspace);
+        }) {}
+
+  /// Imports the home and shows one thing after the other.
   Status run() {
     if (auto failure = importHome()) return failure;
     if (auto failure = synchronise()) return failure;
     for (const DemoStep& step : demoSteps()) {
-      if (auto failure = perform(step)) return failure;
+      if (auto failure = show(step)) return failure;
     }
-    return std::nullopt;
+    return writeOutput(kEnd);
   }
 
   /// How many answers were not the expected ones.
@@ -44,81 +60,80 @@ class Demonstration {
     std::istringstream document{std::string(kDemonstrationHome)};
     const auto homes = readHomeDocument(document, "demonstration home");
     if (!homes) return homes.failure();
-    if (auto failure = session_.platform().importHomes(*homes, false)) return failure;
-    return writeOutput("The demonstration home: " + sizeOf(*homes) + "\n");
+    const auto session = workspace_.home();
+    if (!session) return session.failure();
+    if (auto failure = (*session)->platform().importHomes(*homes, false)) return failure;
+    return writeOutput("A tour on the demonstration home: " + sizeOf(*homes) + "\n");
   }
 
+  /// The names, a line for each kind instead of one for each name.
   Status synchronise() {
-    const auto made = SyncClient::make(session_.module());
+    const auto session = workspace_.assistant();
+    if (!session) return session.failure();
+    const auto made = SyncClient::make((*session)->module());
     if (!made) return made.failure();
     SyncClient& sync = **made;
     sync.begin(kSyncKey);
     const auto changes = sync.allChanges();
     sync.end();
     const std::size_t names = changes.size() - 1;
-    const auto resets = sync.resets();
-    if (resets.size() != 1 || names == 0 || changes.back().postAnchor != resets.front()) {
-      tellDifference("one reset and an entity for each name");
+    if (sync.resets().size() != 1 || names == 0) tellDifference("sync");
+    std::string text = heading("A sync: the assistant's recogniser learns the names of the homes") +
+                       "$ nidus sync\n" + std::to_string(names) + " names, such as";
+    constexpr std::size_t kShown = 5;
+    for (std::size_t i = 0; i < names && i < kShown; ++i) {
+      text += (i == 0 ? " " : ", ") + changes[i * names / kShown].object->name().str();
     }
-    std::string text = heading("A sync tells the assistant " + std::to_string(names) +
-                               " names; the first of them");
-    for (std::size_t i = 0; i < names && i < 3; ++i) {
-      text += jsonLine(changes[i].object->dictionary());
-    }
-    return writeOutput(text);
+    return writeOutput(text + '\n');
   }
 
-  Status perform(const DemoStep& step) {
-    const auto command = readCommand(step.command, "demonstration");
-    if (!command) return command.failure();
-    session_.platform().setLocked(step.isLocked);
-    const auto replies = session_.runner().perform(**command);
-    if (!replies) return replies.failure();
-    std::string text = heading(std::string(step.title)).append(step.command).append(1, '\n');
-    for (const NDDictionary& reply : *replies) text += jsonLine(reply);
-    if (auto failure = writeOutput(text)) return failure;
-    if (summaryOf(*replies) != step.expected) tellDifference(step.expected);
+  Status show(const DemoStep& step) {
+    if (auto failure =
+            writeOutput(heading(step.title) + "$ nidus " + std::string(step.line) + '\n'))
+      return failure;
+    const ExitStatus status = shell_.runLine(step.line);
+    if (status == ExitStatus::platformFailed) {
+      return Failure{Failure::Kind::platform, "demo: the tour ends here"};
+    }
+    if (status != step.expected) tellDifference(step.line);
     return std::nullopt;
   }
 
-  static std::string heading(const std::string& title) { return "\n# " + title + '\n'; }
-
-  void tellDifference(std::string_view expected) {
+  void tellDifference(std::string_view line) {
     ++differences_;
-    reportLine("demo: this differs from what was expected: " + std::string(expected));
+    reportLine("demo: this answer is not the expected one: nidus " + std::string(line));
   }
 
-  Session& session_;
+  Workspace& workspace_;
+  Shell shell_;
   std::size_t differences_ = 0;
 };
 
-ExitStatus demonstrate() {
-  const InterruptionHold hold;  // the folder is removed first
+ExitStatus lead() {
   const auto folder = TemporaryFolder::make();
   if (!folder) return report(folder.failure());
   HomePlatformOptions options;
   options.dataFolder = folder->path();
-  // The expected temperatures are in Celsius, wherever this runs.
+  // The tour shows temperatures in Celsius, wherever it runs.
   options.metric = true;
   // Two replies to one command come in one order.
   options.drainsOnCaller = true;
-  const auto session = Session::open(std::move(options));
-  if (!session) return report(session.failure());
-  if (auto failure = (*session)->openModule()) return report(*failure);
-  Demonstration demonstration(**session);
-  if (auto failure = demonstration.run()) return report(*failure);
-  return (*session)->statusAfter(demonstration.differences() == 0 ? ExitStatus::success
-                                                                  : ExitStatus::otherOutcome);
+  Workspace workspace(std::move(options));
+  Tour tour(workspace);
+  if (auto failure = tour.run()) return report(*failure);
+  return tour.differences() == 0 ? ExitStatus::success : ExitStatus::otherOutcome;
 }
 
 }  // namespace
 
 void declareDemo(CommandSyntax& program) {
+  const auto printsHome = std::make_shared<bool>(false);
   CommandSyntax& syntax =
       program.command("demo", "Shows what the plug-in can do, on a home of its own",
                       "Works in a temporary folder; your own homes are neither read nor changed.\n"
-                      "Exit status 1 when an answer is not the expected one.");
-  syntax.run(demonstrate);
+                      "Exit status: 0, or 1 when an answer is not the expected one.");
+  syntax.flag("--home", *printsHome, "Print the document of the demonstration home instead");
+  syntax.run([printsHome] { return *printsHome ? printText(kDemonstrationHome) : lead(); });
 }
 
 }  // namespace nidus

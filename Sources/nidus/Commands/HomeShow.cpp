@@ -1,5 +1,10 @@
+#include <memory>
+#include <string>
+#include <vector>
+
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/HomeEditing/HomeObjects.h"
 #include "nidus/HomeTree.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Workspace.h"
@@ -7,26 +12,40 @@
 namespace nidus {
 namespace {
 
-ExitStatus showHomes(Workspace& workspace) {
+/// The trees of all homes, or of the one of that name or UUID.
+Result<std::string> treesOf(const std::vector<HomeData>& homes, const std::string& name,
+                            const HomeWords& words) {
+  if (!name.empty()) {
+    const auto index = findHome(homes, name);
+    if (!index) return index.failure();
+    return homeTree(homes[*index], words);
+  }
+  std::string text;
+  for (const HomeData& home : homes) text += homeTree(home, words);
+  return text;
+}
+
+ExitStatus showHomes(const std::string& name, Workspace& workspace) {
   const auto session = workspace.home();
   if (!session) return report(session.failure());
   HomePlatform& platform = (*session)->platform();
   const auto homes = platform.exportHomes();
   if (!homes) return report(homes.failure());
   if (homes->empty()) return printText("no homes yet; import some with nidus home import FILE\n");
-  const HomeWords words(platform);
-  std::string text;
-  for (const HomeData& home : *homes) text += homeTree(home, words);
-  return printText(text);
+  const auto text = treesOf(*homes, name, HomeWords(platform));
+  return text ? printText(*text) : report(text.failure());
 }
 
 }  // namespace
 
 void declareHomeShow(CommandSyntax& home, Workspace& workspace) {
+  const auto name = std::make_shared<std::string>();
   CommandSyntax& syntax =
       home.command("show", "Shows the homes as trees of rooms, accessories, services and values",
                    "Names of types, attributes and values are those that commands use.");
-  syntax.run([&workspace] { return showHomes(workspace); });
+  syntax.argument("HOME", *name, "The name or UUID of one home; without it all are shown");
+  syntax.candidates("HOME", {{CandidateKind::homes}});
+  syntax.run([name, &workspace] { return showHomes(*name, workspace); });
 }
 
 }  // namespace nidus
