@@ -30,11 +30,13 @@ class Shell {
   /// how long each took.
   ExitStatus talk();
 
+  /// Runs the command in `line`, which may begin with the program's name; a failure is reported.
+  ExitStatus runLine(std::string_view line);
+
   /// What completing the end of `line` does.
   [[nodiscard]] LineCompletion complete(std::string_view line);
 
  private:
-  ExitStatus runLine(std::string_view line);
   ExitStatus runWords(std::vector<std::string> words);
   void runTimed(const std::string& line);
   [[nodiscard]] std::vector<std::string> wordsAt(const CompletionPoint& point);
