@@ -78,12 +78,14 @@ class Tour {
     sync.end();
     const std::size_t names = changes.size() - 1;
     if (sync.resets().size() != 1 || names == 0) tellDifference("sync");
-    std::string text = heading("A sync: the assistant's recogniser learns the names of the homes") +
-                       "$ nidus sync\n" + std::to_string(names) + " names, such as";
+    std::string text =
+        heading("A sync: the assistant learns the names (nidus sync prints them all)") +
+        std::to_string(names) + " names:";
     constexpr std::size_t kShown = 5;
     for (std::size_t i = 0; i < names && i < kShown; ++i) {
-      text += (i == 0 ? " " : ", ") + changes[i * names / kShown].object->name().str();
+      text += ' ' + changes[i * names / kShown].object->name().str() + ',';
     }
+    text += " …";
     return writeOutput(text + '\n');
   }
 
