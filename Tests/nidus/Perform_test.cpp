@@ -72,7 +72,7 @@ TEST_F(PerformTest, GoesOnAfterABadLine) {
 TEST_F(PerformTest, CountsBlankLines) {
   const ProgramEnd end = run({"perform", "-"}, "\n  \r\nx\n");
   EXPECT_EQ(end.exitStatus, 2);
-  EXPECT_THAT(end.errors, IsOneFailure("standard input: line 3: "));
+  EXPECT_THAT(end.errors, IsOneFailure("standard input: line 3"));
 }
 
 TEST_F(PerformTest, AnswersALineBeforeTheNext) {
@@ -92,7 +92,7 @@ TEST_F(PerformTest, ReadsAFileOfLines) {
   const ProgramEnd end = run({"perform", file});
   EXPECT_EQ(end.exitStatus, 2);
   EXPECT_EQ(linesOf(end.output), 2U);
-  EXPECT_THAT(end.errors, IsOneFailure(file + ": line 2: "));
+  EXPECT_THAT(end.errors, IsOneFailure(file + ": line 2"));
 }
 
 TEST_F(PerformTest, ReadsAFileWhoseFirstLineIsBad) {
@@ -101,7 +101,13 @@ TEST_F(PerformTest, ReadsAFileWhoseFirstLineIsBad) {
   const ProgramEnd end = run({"perform", file});
   EXPECT_EQ(end.exitStatus, 2);
   EXPECT_EQ(linesOf(end.output), 1U);
-  EXPECT_THAT(end.errors, IsOneFailure(file + ": line 1: "));
+  EXPECT_THAT(end.errors, IsOneFailure(file + ": line 1, column 12: "));
+}
+
+TEST_F(PerformTest, NamesTheColumnOfALine) {
+  const ProgramEnd end = run({"perform"}, readCommandLine("Lamp") + "\n\n[,\n");
+  EXPECT_EQ(end.exitStatus, 2);
+  EXPECT_THAT(end.errors, IsOneFailure("standard input: line 3, column 2: "));
 }
 
 TEST_F(PerformTest, ReadsAFileThatIsOneDocument) {
@@ -161,7 +167,7 @@ TEST_F(PerformTest, LeavesTheHomesOnBadInput) {
     SCOPED_TRACE(end.errors);
     EXPECT_EQ(end.exitStatus, 2);
     EXPECT_THAT(end.output, IsEmpty());
-    EXPECT_THAT(end.errors, IsOneFailure("standard input: line 1: "));
+    EXPECT_THAT(end.errors, IsOneFailure("standard input: line 1"));
   }
   EXPECT_EQ(exported(), before);
 }

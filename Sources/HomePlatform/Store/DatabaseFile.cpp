@@ -62,6 +62,9 @@ Status prepareDatabaseFile(const fs::path& file) {
                    "give yourself write permission on it, or choose another one");
   }
   if (Status failed = makeFile(file)) return failed;
+  if (std::error_code ignored; fs::is_directory(file, ignored)) {
+    return failure(file, "a folder is where the database has to be", EISDIR, "move it away");
+  }
   if (mayWrite(file, 0)) return std::nullopt;
   return failure(file, "the database cannot be written", errno,
                  "give yourself write permission on the file");

@@ -84,6 +84,10 @@ int replaceFile(const std::filesystem::path& path, std::string_view text) {
 }  // namespace
 
 Result<PreferencesContent> PreferencesFile::read() const {
+  if (std::error_code ignored; std::filesystem::is_directory(path_, ignored)) {
+    return Failure{Failure::Kind::platform,
+                   path_.string() + ": a folder is where the preferences have to be; move it away"};
+  }
   errno = 0;
   std::ifstream file(path_, std::ios::binary);
   if (!file) {

@@ -19,6 +19,15 @@ namespace {
 
 constexpr const char kStandardInput[] = "standard input";
 
+/// A place in a text of one line comes behind the number of that line: "line 3, column 7".
+Failure inOnePlace(Failure failure, const std::string& name) {
+  constexpr std::string_view kOwnLine = ": line 1, column ";
+  if (failure.message.compare(name.size(), kOwnLine.size(), kOwnLine) == 0) {
+    failure.message.replace(name.size(), kOwnLine.size(), ", column ");
+  }
+  return failure;
+}
+
 /// Performs commands one after the other and keeps the worst of their statuses.
 class Performance {
  public:
@@ -27,14 +36,15 @@ class Performance {
   /// Reads and performs the command in `text`, and prints its replies; `name` stands for the text
   /// in messages.
   void perform(std::string_view text, const std::string& name) {
-    status_ = std::max(status_.value_or(ExitStatus::success), performOne(text, name));
+    const auto command = readCommand(text, name);
+    keep(command ? performOne(**command, name) : report(command.failure()));
   }
 
   /// Performs the command of each line of `in` that is not blank, before the next line is read.
   void performLines(std::istream& in, const std::string& name) {
     std::string line;
     for (std::size_t number = 1; !isCutShort_ && std::getline(in, line); ++number) {
-      if (!isBlank(line)) perform(line, name + ": line " + std::to_string(number));
+      if (!isBlank(line)) performLine(line, name + ": line " + std::to_string(number));
     }
     if (in.bad()) {
       status_ = report({Failure::Kind::platform, name + ": reading failed; try again"});
@@ -48,10 +58,18 @@ class Performance {
   [[nodiscard]] ExitStatus status() const { return status_.value_or(ExitStatus::success); }
 
  private:
-  ExitStatus performOne(std::string_view text, const std::string& name) {
+  void performLine(std::string_view text, const std::string& name) {
     const auto command = readCommand(text, name);
-    if (!command) return report(command.failure());
-    const auto replies = session_.runner().perform(**command);
+    keep(command ? performOne(**command, name) : report(inOnePlace(command.failure(), name)));
+  }
+
+  /// The highest status counts.
+  void keep(ExitStatus status) {
+    status_ = std::max(status_.value_or(ExitStatus::success), status);
+  }
+
+  ExitStatus performOne(const VAHACommand& command, const std::string& name) {
+    const auto replies = session_.runner().perform(command);
     if (!replies) return cutShort(replies.failure());
     if (replies->empty()) {
       reportLine(name + ": the plug-in gave no reply; see what is there with nidus records");

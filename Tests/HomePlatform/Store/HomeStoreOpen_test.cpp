@@ -179,7 +179,9 @@ TEST_F(OpenHomeStoreTest, SaysWhenTheFileMayNotBeWritten) {
 
 TEST_F(OpenHomeStoreTest, SaysWhenTheFileIsAFolder) {
   fs::create_directory(file());
-  EXPECT_THAT(problem(), HasSubstr("the database cannot be opened for writing"));
+  EXPECT_EQ(problem(), file().string() +
+                           ": a folder is where the database has to be (Is a directory); move it "
+                           "away");
 }
 
 TEST_F(OpenHomeStoreTest, LetsManyMakeItAtOnce) {

@@ -103,6 +103,13 @@ TEST_F(PreferencesTest, RefusesDamagedFileAtOpen) {
   }
 }
 
+TEST_F(PreferencesTest, RefusesAFolderInPlaceOfTheFile) {
+  std::filesystem::create_directory(folder_.path() / kFile);
+  const auto opened = Preferences::open(folder_.path(), [](const Failure&) {});
+  ASSERT_FALSE(opened);
+  EXPECT_THAT(opened.failure().message, HasSubstr("a folder is where the preferences"));
+}
+
 TEST_F(PreferencesTest, SynchronizeTakesInChanges) {
   open(R"({"level": 3})");
   folder_.write(kFile, R"({"level": 4})");
