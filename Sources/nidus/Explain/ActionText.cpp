@@ -45,9 +45,10 @@ class ActionTelling {
     TextTable table({kObject, kRoom, kAttribute, kKnown, "AFTERWARDS"});
     for (std::size_t i = 0; i < before_.all().size() && i < after.all().size(); ++i) {
       const PlacedCharacteristic& old = before_.all()[i];
-      const std::string oldValue = valueOf(old, old.characteristic->value);
-      const std::string newValue = valueOf(old, after.all()[i].characteristic->value);
-      if (oldValue != newValue) table.addRow(withObject(old, {oldValue, newValue}));
+      const PlacedCharacteristic& now = after.all()[i];
+      if (now.hasValueOf(old)) continue;
+      table.addRow(withObject(
+          old, {valueOf(old, old.characteristic->value), valueOf(now, now.characteristic->value)}));
     }
     return table.empty() ? "No value would be another one afterwards.\n"
                          : "Values that would be others afterwards:\n" + table.text(style_);

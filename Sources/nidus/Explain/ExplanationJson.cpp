@@ -1,3 +1,4 @@
+#include <cstddef>
 #include <utility>
 
 #include "AssistantHost/JsonLine.h"
@@ -40,15 +41,13 @@ NDDictionaryList reachedOf(const Rehearsal& rehearsal, const HomeIndex& before) 
 
 NDDictionaryList changesOf(const HomeIndex& before, const HomeIndex& after) {
   NDDictionaryList list;
-  for (const PlacedCharacteristic& old : before.all()) {
-    const auto* now = after.find(old.place());
-    const NDDictionaryValue oldValue = transcriptOf(old.characteristic->value);
-    const NDDictionaryValue newValue =
-        now ? transcriptOf(now->characteristic->value) : NDDictionaryValue();
-    if (oldValue == newValue) continue;
+  for (std::size_t i = 0; i < before.all().size() && i < after.all().size(); ++i) {
+    const PlacedCharacteristic& old = before.all()[i];
+    const PlacedCharacteristic& now = after.all()[i];
+    if (now.hasValueOf(old)) continue;
     NDDictionary entry = placeOf(old.place());
-    entry.set("before", oldValue);
-    entry.set("after", newValue);
+    entry.set("before", transcriptOf(old.characteristic->value));
+    entry.set("after", transcriptOf(now.characteristic->value));
     list.emplace_back(std::move(entry));
   }
   return list;

@@ -15,21 +15,31 @@ std::string PlacedCharacteristic::objectName() const {
 }
 
 std::string PlacedCharacteristic::roomName() const {
-  const auto room =
-      std::find_if(home->rooms.begin(), home->rooms.end(),
-                   [this](const RoomData& candidate) { return accessory->room == candidate.uuid; });
-  return room == home->rooms.end() ? "" : onOneLine(room->name.view());
+  return room ? onOneLine(room->name.view()) : "";
+}
+
+bool PlacedCharacteristic::hasValueOf(const PlacedCharacteristic& other) const {
+  const NDValueRef& own = characteristic->value;
+  const NDValueRef& others = other.characteristic->value;
+  return own == others || (own && others && own->isEqual(*others));
 }
 
 HomeIndex::HomeIndex(const std::vector<HomeData>& homes) : homes_(homes) {
   for (const HomeData& home : homes) {
+    std::map<NDUUID, const RoomData*> rooms;
+    for (const RoomData& room : home.rooms) rooms.emplace(room.uuid, &room);
     for (const AccessoryData& accessory : home.accessories) {
-      for (const ServiceData& service : accessory.services) {
-        for (const CharacteristicData& characteristic : service.characteristics) {
-          all_.push_back({&home, &accessory, &service, &characteristic});
-          places_.emplace(all_.back().place(), all_.size() - 1);
-        }
-      }
+      const auto room = accessory.room ? rooms.find(*accessory.room) : rooms.end();
+      add(home, room == rooms.end() ? nullptr : room->second, accessory);
+    }
+  }
+}
+
+void HomeIndex::add(const HomeData& home, const RoomData* room, const AccessoryData& accessory) {
+  for (const ServiceData& service : accessory.services) {
+    for (const CharacteristicData& characteristic : service.characteristics) {
+      all_.push_back({&home, room, &accessory, &service, &characteristic});
+      places_.emplace(all_.back().place(), all_.size() - 1);
     }
   }
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <map>
 #include <string>
 #include <vector>
@@ -9,9 +10,11 @@
 
 namespace nidus {
 
-/// A characteristic with all that it is part of; nothing is null. It points into the homes.
+/// A characteristic with all that it is part of. It points into the homes; only the room may be
+/// null.
 struct PlacedCharacteristic {
   const HomeData* home;
+  const RoomData* room;
   const AccessoryData* accessory;
   const ServiceData* service;
   const CharacteristicData* characteristic;
@@ -21,6 +24,8 @@ struct PlacedCharacteristic {
   [[nodiscard]] std::string objectName() const;
   /// The name of the room; empty when it stands in none.
   [[nodiscard]] std::string roomName() const;
+  /// Whether the value that was known last is the same in both.
+  [[nodiscard]] bool hasValueOf(const PlacedCharacteristic& other) const;
 };
 
 /// All characteristics of homes, to be found by their places.
@@ -36,6 +41,8 @@ class HomeIndex {
   [[nodiscard]] const std::vector<PlacedCharacteristic>& all() const noexcept { return all_; }
 
  private:
+  void add(const HomeData& home, const RoomData* room, const AccessoryData& accessory);
+
   const std::vector<HomeData>& homes_;
   std::vector<PlacedCharacteristic> all_;
   std::map<HomeCharacteristic, std::size_t> places_;
