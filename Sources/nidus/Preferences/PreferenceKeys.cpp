@@ -99,7 +99,7 @@ std::string expectationOf(const PreferenceKey& key) {
 }
 
 std::string levelText(std::int64_t level) {
-  const std::string number = std::to_string(level);
+  std::string number = std::to_string(level);
   if (level < 0) return number;
   const auto known = std::min(static_cast<std::size_t>(level), kLevelNames.size() - 1);
   return number + " (" + std::string(kLevelNames.at(known)) + ')';
