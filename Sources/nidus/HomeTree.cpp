@@ -13,15 +13,40 @@ namespace {
 struct Branch {
   std::string text;
   std::vector<Branch> below;
+  Colour colour = Colour::none;
 };
 
-void draw(const std::vector<Branch>& branches, const std::string& margin, std::string& out) {
-  for (const Branch& branch : branches) {
-    const bool isLast = &branch == &branches.back();
-    out += margin + (isLast ? "└─ " : "├─ ") + onOneLine(branch.text) + '\n';
-    draw(branch.below, margin + (isLast ? "   " : "│  "), out);
+/// Draws branches on a terminal or in a pipe. What is longer than a line of the terminal goes on
+/// under itself.
+class TreeDrawing {
+ public:
+  explicit TreeDrawing(const TerminalStyle& style) : style_(style) {}
+
+  void drawRoot(const std::string& text) { drawText(text, Colour::title, "", ""); }
+  void draw(const std::vector<Branch>& branches, const std::string& margin = "") {
+    for (const Branch& branch : branches) {
+      const bool isLast = &branch == &branches.back();
+      const std::string below = margin + (isLast ? "   " : "│  ");
+      drawText(branch.text, branch.colour, margin + (isLast ? "└─ " : "├─ "), below + "  ");
+      draw(branch.below, below);
+    }
   }
-}
+  [[nodiscard]] const std::string& text() const { return text_; }
+
+ private:
+  void drawText(const std::string& text, Colour colour, std::string margin,
+                const std::string& marginOfRest) {
+    const std::size_t taken = cellsOf(marginOfRest);
+    const std::size_t cells = style_.columns > taken ? style_.columns - taken : 0;
+    for (const std::string& line : wrapped(onOneLine(text), cells)) {
+      text_ += coloured(margin, Colour::faint, style_) + coloured(line, colour, style_) + '\n';
+      margin = marginOfRest;
+    }
+  }
+
+  const TerminalStyle& style_;
+  std::string text_;
+};
 
 std::string joined(const std::vector<std::string>& parts) {
   std::string text;
@@ -56,6 +81,8 @@ Branch accessoryBranch(const AccessoryData& accessory, const HomeWords& words) {
   if (!accessory.reachable) notes.emplace_back("unreachable");
   if (accessory.requiresUnlock) notes.emplace_back("requires an unlocked device");
   Branch branch{accessory.name.str() + (notes.empty() ? "" : " (" + joined(notes) + ')'), {}};
+  if (accessory.requiresUnlock) branch.colour = Colour::warning;
+  if (!accessory.reachable) branch.colour = Colour::bad;
   for (const ServiceData& service : accessory.services) {
     branch.below.push_back(serviceBranch(service, words));
   }
@@ -65,7 +92,7 @@ Branch accessoryBranch(const AccessoryData& accessory, const HomeWords& words) {
 /// The accessories that stand in `room`, or in no room for none.
 Branch roomBranch(const std::string& name, const std::optional<NDUUID>& room, const HomeData& home,
                   const HomeWords& words) {
-  Branch branch{name, {}};
+  Branch branch{name, {}, Colour::title};
   for (const AccessoryData& accessory : home.accessories) {
     if (accessory.room == room) branch.below.push_back(accessoryBranch(accessory, words));
   }
@@ -107,14 +134,14 @@ void addList(std::vector<Branch>& branches, const std::string& title,
              const std::vector<Object>& objects,
              std::string (*describe)(const Object&, const HomeData&), const HomeData& home) {
   if (objects.empty()) return;
-  Branch list{title, {}};
+  Branch list{title, {}, Colour::title};
   for (const Object& object : objects) list.below.push_back({describe(object, home), {}});
   branches.push_back(std::move(list));
 }
 
 }  // namespace
 
-std::string homeTree(const HomeData& home, const HomeWords& words) {
+std::string homeTree(const HomeData& home, const HomeWords& words, const TerminalStyle& style) {
   std::vector<Branch> branches;
   for (const RoomData& room : home.rooms) {
     branches.push_back(roomBranch(room.name.str(), room.uuid, home, words));
@@ -125,9 +152,10 @@ std::string homeTree(const HomeData& home, const HomeWords& words) {
   addList(branches, "groups", home.serviceGroups, groupText, home);
   if (!home.actionSets.empty()) branches.push_back({"scenes: " + namesOf(home.actionSets), {}});
   if (!home.triggers.empty()) branches.push_back({"triggers: " + namesOf(home.triggers), {}});
-  std::string text = onOneLine(home.name.view()) + (home.primary ? " (primary)" : "") + '\n';
-  draw(branches, "", text);
-  return text;
+  TreeDrawing drawing(style);
+  drawing.drawRoot(home.name.str() + (home.primary ? " (primary)" : ""));
+  drawing.draw(branches);
+  return drawing.text();
 }
 
 }  // namespace nidus

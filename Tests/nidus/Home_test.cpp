@@ -1,4 +1,5 @@
 #include "nidus/ProgramTest.h"
+#include "nidus/TerminalProcess.h"
 
 namespace nidus {
 namespace {
@@ -114,6 +115,17 @@ TEST_F(HomeCommandTest, ShowsATree) {
             "├─ groups\n"
             "│  └─ Corner: Lamp\n"
             "└─ scenes: Night\n");
+}
+
+TEST_F(HomeCommandTest, ColoursTheTreeOnATerminal) {
+  importSmallHome();
+  const std::string tree = runOnTerminal(start({"home", "show"}), 40).output;
+  EXPECT_THAT(tree, HasSubstr("\x1b[1mCottage (primary)\x1b[0m\n"));
+  EXPECT_THAT(tree, HasSubstr("\x1b[2m│  ├─ \x1b[0mLamp\n"));
+  EXPECT_THAT(tree, HasSubstr("\x1b[31mAway (unreachable)\x1b[0m\n"));
+  EXPECT_THAT(tree, HasSubstr("\x1b[2m│  │  └─ \x1b[0mLamp [LIGHT] POWER on,\n"
+                              "\x1b[2m│  │     "
+                              "  \x1b[0mBRIGHTNESS 40 %\n"));
 }
 
 TEST_F(HomeCommandTest, ShowsNewValues) {

@@ -15,13 +15,14 @@ namespace {
 /// The trees of all homes, or of the one of that name or UUID.
 Result<std::string> treesOf(const std::vector<HomeData>& homes, const std::string& name,
                             const HomeWords& words) {
+  const TerminalStyle style = standardOutputStyle();
   if (!name.empty()) {
     const auto index = findHome(homes, name);
     if (!index) return index.failure();
-    return homeTree(homes[*index], words);
+    return homeTree(homes[*index], words, style);
   }
   std::string text;
-  for (const HomeData& home : homes) text += homeTree(home, words);
+  for (const HomeData& home : homes) text += homeTree(home, words, style);
   return text;
 }
 

@@ -7,7 +7,6 @@
 
 #include <cstdint>
 #include <cstdlib>
-#include <vector>
 
 namespace nidus {
 namespace {
@@ -85,6 +84,22 @@ std::string shortened(std::string_view text, std::size_t cells) {
   if (cells == 0) return {};
   const std::string_view kept = text.substr(0, fittingSize(text, cells - cellsOf(kEllipsis)));
   return std::string(kept.substr(0, kept.find_last_not_of(' ') + 1)).append(kEllipsis);
+}
+
+std::vector<std::string> wrapped(std::string_view text, std::size_t cells) {
+  std::vector<std::string> lines = {{}};
+  while (!text.empty()) {
+    const std::string_view word = text.substr(0, text.find(' ', 1));  // with the blank before it
+    std::string& line = lines.back();
+    const bool isFull = !line.empty() && cellsOf(line) + cellsOf(word) > cells;
+    if (cells > 0 && isFull) {
+      lines.emplace_back(word.substr(1));
+    } else {
+      line += word;
+    }
+    text.remove_prefix(word.size());
+  }
+  return lines;
 }
 
 }  // namespace nidus

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace nidus {
 
@@ -31,5 +32,9 @@ enum class Colour { none, title, faint, good, warning, bad };
 /// The beginning of `text` with an ellipsis in at most `cells` cells, or all of it where it fits. A
 /// character stays together with what combines with it.
 [[nodiscard]] std::string shortened(std::string_view text, std::size_t cells);
+
+/// The lines of at most `cells` cells that `text` takes when it is broken at its blanks; all on one
+/// line for 0. What has no blank is not broken. At least one line.
+[[nodiscard]] std::vector<std::string> wrapped(std::string_view text, std::size_t cells);
 
 }  // namespace nidus

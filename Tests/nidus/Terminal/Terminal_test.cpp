@@ -56,6 +56,30 @@ TEST(ShortenedTest, KeepsWithinTheCells) {
   }
 }
 
+struct WrappingCase {
+  const char* label;
+  std::string text;
+  std::size_t cells;
+  std::vector<std::string> lines;
+};
+
+TEST(WrappedTest, BreaksAtBlanks) {
+  const WrappingCase table[] = {
+      {"nothing", "", 5, {""}},
+      {"fits", "on, off", 7, {"on, off"}},
+      {"one too long", "on, off", 6, {"on,", "off"}},
+      {"several", "a b c d e", 3, {"a b", "c d", "e"}},
+      {"no blank", "brightness", 3, {"brightness"}},
+      {"long word within", "a brightness b", 4, {"a", "brightness", "b"}},
+      {"wide characters", "日本 語", 5, {"日本", "語"}},
+      {"without limits", "on, off", 0, {"on, off"}},
+  };
+  for (const WrappingCase& wrapping : table) {
+    SCOPED_TRACE(wrapping.label);
+    EXPECT_EQ(wrapped(wrapping.text, wrapping.cells), wrapping.lines);
+  }
+}
+
 TEST(ColouredTest, ColoursOnlyWhereThereAreColours) {
   const TerminalStyle plain;
   const TerminalStyle colourful = {true, 80};
