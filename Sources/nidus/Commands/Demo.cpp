@@ -10,6 +10,7 @@
 #include "nidus/Commands/Commands.h"
 #include "nidus/Commands/DemoSteps.h"
 #include "nidus/Commands/HomeInput.h"
+#include "nidus/InterruptionHold.h"
 #include "nidus/Shell/Shell.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/TemporaryFolder.h"
@@ -112,6 +113,7 @@ class Tour {
 };
 
 ExitStatus lead() {
+  const InterruptionHold hold;  // the folder is removed first
   const auto folder = TemporaryFolder::make();
   if (!folder) return report(folder.failure());
   HomePlatformOptions options;
