@@ -95,7 +95,7 @@ TEST_F(InstalledModuleTest, MakesADemonstrationFail) {
   install(NIDUS_SILENT_MODULE);
   const ProgramEnd end = runInstalled({"demo"});
   EXPECT_EQ(end.exitStatus, 1);
-  EXPECT_THAT(end.errors, HasSubstr("nidus: demo: this differs from what was expected"));
+  EXPECT_THAT(end.errors, HasSubstr("nidus: demo: this answer is not the expected one"));
 }
 
 }  // namespace
