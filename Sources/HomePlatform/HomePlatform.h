@@ -15,6 +15,7 @@
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
 #include "HomePlatform/Store/HomeEdit.h"
+#include "HomePlatform/Store/HomeWatch.h"
 #include "HomePlatform/Store/StoreProgress.h"
 #include "PlatformModel/NDPlatform.h"
 
@@ -79,6 +80,11 @@ class HomePlatform : public NDPlatform {
   [[nodiscard]] virtual Status editHomes(const HomeEdit& edit) = 0;
   /// The homes as the database has them now.
   [[nodiscard]] virtual Result<std::vector<HomeData>> exportHomes() = 0;
+
+  /// Watches the homes of the data folder, whoever changes them; see HomeWatch. A platform in
+  /// memory cannot be watched.
+  [[nodiscard]] virtual Result<std::unique_ptr<HomeWatch>> watchHomes(
+      HomeWatch::Handler handler) = 0;
 
   /// The words that this platform knows, the user's own included; valid as long as the platform.
   [[nodiscard]] virtual const Vocabulary& vocabulary() const noexcept = 0;

@@ -126,6 +126,14 @@ Status LocalHomePlatform::changeHomesUnlocked(const std::function<Status()>& cha
 
 Result<std::vector<HomeData>> LocalHomePlatform::exportHomes() { return store_->loadHomes(); }
 
+Result<std::unique_ptr<HomeWatch>> LocalHomePlatform::watchHomes(HomeWatch::Handler handler) {
+  if (!options_.dataFolder) {
+    return Failure{Failure::Kind::badInput,
+                   "homes in memory cannot be watched; open those of a data folder"};
+  }
+  return HomeWatch::start(*options_.dataFolder / kDatabaseFile, std::move(handler));
+}
+
 Status LocalHomePlatform::changePreferences(const std::map<std::string, JsonValue>& changes) {
   if (options_.dataFolder) {
     const Result<FolderLock> lock = FolderLock::take(*options_.dataFolder);
@@ -157,7 +165,7 @@ void LocalHomePlatform::watchPreferences() {
   if (!options_.dataFolder || options_.drainsOnCaller) return;
   const NDLock lock(mutex_);
   if (isShutDown_ || watch_) return;
-  auto started = FolderWatch::start(*options_.dataFolder, Preferences::kFileName, [this] {
+  auto started = FolderWatch::start(*options_.dataFolder, {{Preferences::kFileName}}, [this] {
     preferences_->synchronize();
     if (preferences_->takeChange()) notifications_->post(kPreferencesChanged);
   });

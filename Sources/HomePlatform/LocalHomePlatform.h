@@ -52,6 +52,7 @@ class LocalHomePlatform final : public HomePlatform {
                                    const StoreProgress& progress) override;
   [[nodiscard]] Status editHomes(const HomeEdit& edit) override;
   [[nodiscard]] Result<std::vector<HomeData>> exportHomes() override;
+  [[nodiscard]] Result<std::unique_ptr<HomeWatch>> watchHomes(HomeWatch::Handler handler) override;
   [[nodiscard]] const Vocabulary& vocabulary() const noexcept override {
     return mapper_->vocabulary();
   }

@@ -92,6 +92,18 @@ class SqliteHomeStore final : public HomeStore {
     return std::nullopt;
   }
 
+  Result<bool> waitForWriter() override {
+    NDLock lock(mutex_);
+    try {
+      // Who has the only writing transaction there can be knows that no other one is open.
+      const Transaction turn(database_, Transaction::Kind::writing);
+      return true;
+    } catch (const DatabaseError& error) {
+      if (error.kind == DatabaseError::Kind::locked) return false;
+      return failureOf(error, name_);
+    }
+  }
+
   Result<std::uint64_t> version() override {
     NDLock lock(mutex_);
     try {

@@ -61,6 +61,9 @@ class HomeStore {
   /// after each `replaceHomes`, `mergeHomes` and `editHomes` of this one; `writeValues` of this one
   /// keeps it.
   [[nodiscard]] virtual Result<std::uint64_t> version() = 0;
+  /// Waits until nobody is in the midst of a change, so that all that was written up to now can be
+  /// seen. False when somebody still was after the lock timeout.
+  [[nodiscard]] virtual Result<bool> waitForWriter() = 0;
 };
 
 }  // namespace nidus

@@ -4,6 +4,7 @@
 #include <sys/eventfd.h>
 #include <sys/inotify.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <system_error>
@@ -19,30 +20,31 @@ Failure watchFailure(const std::filesystem::path& folder, int error) {
   return {Failure::Kind::platform,
           folder.string() +
               ": changes cannot be watched: " + std::generic_category().message(error) +
-              "; preferences that change are seen by programs started later"};
+              "; end other programs that watch files, or raise the limits in /proc/sys/fs/inotify"};
 }
 
 }  // namespace
 
 Result<std::unique_ptr<FolderWatch>> FolderWatch::start(const std::filesystem::path& folder,
-                                                        std::string name,
+                                                        WatchedFiles files,
                                                         std::function<void()> onChange) {
   FileDescriptor events(::inotify_init1(IN_CLOEXEC | IN_NONBLOCK));
   if (!events) return watchFailure(folder, errno);
   FileDescriptor stop(::eventfd(0, EFD_CLOEXEC));
   if (!stop) return watchFailure(folder, errno);
-  if (::inotify_add_watch(events.get(), folder.c_str(), kChanges) < 0) {
+  const std::uint32_t changes = kChanges | (files.eachWrite ? std::uint32_t{IN_MODIFY} : 0);
+  if (::inotify_add_watch(events.get(), folder.c_str(), changes) < 0) {
     return watchFailure(folder, errno);
   }
-  return std::unique_ptr<FolderWatch>(
-      new FolderWatch(std::move(events), std::move(stop), std::move(name), std::move(onChange)));
+  return std::unique_ptr<FolderWatch>(new FolderWatch(std::move(events), std::move(stop),
+                                                      std::move(files.names), std::move(onChange)));
 }
 
-FolderWatch::FolderWatch(FileDescriptor events, FileDescriptor stop, std::string name,
+FolderWatch::FolderWatch(FileDescriptor events, FileDescriptor stop, std::vector<std::string> names,
                          std::function<void()> onChange)
     : events_(std::move(events)),
       stop_(std::move(stop)),
-      name_(std::move(name)),
+      names_(std::move(names)),
       onChange_(std::move(onChange)),
       thread_([this] { run(); }) {}
 
@@ -67,7 +69,11 @@ bool FolderWatch::waitForEvents() const {
   return waited[1].revents == 0;
 }
 
-/// Says whether one of the events that wait concerns the file.
+bool FolderWatch::isWatched(std::string_view name) const {
+  return std::find(names_.begin(), names_.end(), name) != names_.end();
+}
+
+/// Says whether one of the events that wait concerns the files.
 bool FolderWatch::readEvents() const {
   alignas(inotify_event) char block[4096];
   bool isConcerned = false;
@@ -78,8 +84,8 @@ bool FolderWatch::readEvents() const {
       inotify_event event = {};
       std::memcpy(&event, block + at, sizeof event);
       const char* name = block + at + sizeof event;
-      const bool isLost = (event.mask & IN_Q_OVERFLOW) != 0;
-      if (isLost || (event.len > 0 && name_ == name)) isConcerned = true;
+      const bool isForAll = (event.mask & (IN_Q_OVERFLOW | IN_IGNORED)) != 0;
+      if (isForAll || (event.len > 0 && isWatched(name))) isConcerned = true;
       at += static_cast<ssize_t>(sizeof event + event.len);
     }
   }

@@ -1,5 +1,3 @@
-#include <string>
-
 #include "HomePlatform/System/Preferences.h"
 #include "nidus/Doctor/Checks.h"
 #include "nidus/Doctor/Remedy.h"
@@ -10,17 +8,15 @@ namespace {
 
 void checkMember(const JsonValue::Member& member, const std::string& file, Findings& findings) {
   const std::string place = file + ": " + member.first;
-  const std::string key = shellWord(member.first);
-  const PreferenceKey* known = findPreferenceKey(member.first);
-  if (!known) {
-    findings.push_back({Severity::note, place, "nothing uses it",
-                        "remove it with nidus preferences unset " + key});
-  } else if (!isValidPreference(*known, member.second)) {
-    const bool isFlag = known->kind == PreferenceKey::Kind::flag;
+  const std::string name = shellWord(member.first);
+  const PreferenceKey* key = findPreferenceKey(member.first);
+  if (!key) {
+    findings.push_back(
+        {Severity::note, place, "nothing reads it", "nidus preferences unset " + name});
+  } else if (!isValidPreference(*key, member.second)) {
     findings.push_back({Severity::attention, place,
-                        std::string("it is no ") + (isFlag ? "true or false" : "whole number") +
-                            ", so it counts as missing",
-                        "nidus preferences set " + key + (isFlag ? " true" : " 5")});
+                        "it counts as missing, as it is not " + expectationOf(*key),
+                        "nidus preferences set " + name + " VALUE"});
   }
 }
 

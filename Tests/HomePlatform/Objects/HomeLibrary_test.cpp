@@ -41,6 +41,7 @@ class ScriptedStore final : public HomeStore {
     if (onWrite) onWrite();
     return std::nullopt;
   }
+  Result<bool> waitForWriter() override { return true; }
   Result<std::uint64_t> version() override {
     if (isBroken) return kBroken;
     return number;

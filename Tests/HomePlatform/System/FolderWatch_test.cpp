@@ -3,6 +3,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <fstream>
+
 #include "PlatformModel/System/NDMainQueue.h"
 #include "Support/TestFolder.h"
 
@@ -15,7 +17,7 @@ using testing::HasSubstr;
 class FolderWatchTest : public testing::Test {
  protected:
   void SetUp() override {
-    auto started = FolderWatch::start(folder_.path(), "watched",
+    auto started = FolderWatch::start(folder_.path(), {{"watched", "too"}},
                                       [this] { queue_.async([this] { ++changes_; }); });
     ASSERT_TRUE(started) << started.failure().message;
     watch_ = std::move(*started);
@@ -57,8 +59,31 @@ TEST_F(FolderWatchTest, IgnoresOtherFiles) {
   EXPECT_EQ(changes_, 2);
 }
 
+TEST_F(FolderWatchTest, SeesEachOfTheFiles) {
+  folder_.write("too", "1");
+  waitFor(2);
+}
+
+TEST_F(FolderWatchTest, SeesTheFolderGo) {
+  std::filesystem::remove(folder_.path());
+  waitFor(2);
+}
+
+TEST(FolderWatchEachWriteTest, SeesWritesToAnOpenFile) {
+  const TestFolder folder;
+  NDMainQueue queue;
+  int changes = 0;
+  const auto watch = FolderWatch::start(folder.path(), {{"log"}, true},
+                                        [&] { queue.async([&changes] { ++changes; }); });
+  ASSERT_TRUE(watch);
+  queue.runUntil([&changes] { return changes == 1; });
+  std::ofstream log(folder.path() / "log");
+  log << "1" << std::flush;
+  queue.runUntil([&changes] { return changes >= 2; });
+}
+
 TEST(FolderWatchFailureTest, NamesTheFolder) {
-  const auto started = FolderWatch::start("/nonexistent/folder", "watched", [] {});
+  const auto started = FolderWatch::start("/nonexistent/folder", {{"watched"}}, [] {});
   ASSERT_FALSE(started);
   EXPECT_THAT(started.failure().message, HasSubstr("/nonexistent/folder"));
 }

@@ -120,8 +120,8 @@ TEST_F(PreferencesCheckTest, FindsValuesOfTheWrongType) {
                               {"NidusLogLevel", JsonValue{7.5F}}};
   EXPECT_THAT(findingsOf(checkPreferences),
               ElementsAre(NeedsAttention("kHomesConfigured",
-                                         HasSubstr("nidus preferences set kHomesConfigured true")),
-                          NeedsAttention("NidusLogLevel", HasSubstr("no whole number"))));
+                                         HasSubstr("nidus preferences set kHomesConfigured VALUE")),
+                          NeedsAttention("NidusLogLevel", HasSubstr("counts as missing"))));
 }
 
 TEST_F(PreferencesCheckTest, NotesKeysThatNothingUses) {
