@@ -115,6 +115,7 @@ void declareWorkspaceCommands(CommandSyntax& program, Workspace& workspace) {
   declarePreferences(program, workspace);
   declareExplain(program, workspace);
   declareDoctor(program, workspace);
+  declareWatch(program, workspace);
 }
 
 namespace {

@@ -47,6 +47,7 @@ TEST_F(ProgramTest, HelpsOnEachLevel) {
       {{"shell"}, {"history", "Example", "Exit status"}},
       {{"demo"}, {"temporary folder"}},
       {{"doctor"}, {"--json", "Example", "Exit status"}},
+      {{"watch"}, {"--json", "--room", "Example", "Exit status"}},
   };
   for (const HelpCase& help : table) {
     std::vector<std::string> arguments = help.command;

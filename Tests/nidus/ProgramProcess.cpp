@@ -65,11 +65,20 @@ std::optional<std::string> ProgramProcess::readLine() {
   return std::nullopt;
 }
 
+void ProgramProcess::sendSignal(int signal) const { ::kill(process_, signal); }
+
+void ProgramProcess::closeOutput() {
+  close(output_);
+  output_ = -1;
+}
+
 ProgramEnd ProgramProcess::finish() {
   close(input_);
   std::string output;
-  for (auto line = readLine(); line; line = readLine()) output += *line + '\n';
-  close(output_);
+  if (output_ >= 0) {
+    for (auto line = readLine(); line; line = readLine()) output += *line + '\n';
+    closeOutput();
+  }
   ProgramEnd end = waitForEnd(process_);
   process_ = -1;
   end.output = output;

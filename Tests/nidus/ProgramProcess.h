@@ -44,6 +44,9 @@ class ProgramProcess {
   /// Waits for the next line of its output and gives it without its end; none when the output has
   /// ended or nothing comes for a minute.
   [[nodiscard]] std::optional<std::string> readLine();
+  void sendSignal(int signal) const;
+  /// Goes away as the reader of its output.
+  void closeOutput();
   /// Ends the input, and gives what is left of the output.
   [[nodiscard]] ProgramEnd finish();
 

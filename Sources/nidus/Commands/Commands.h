@@ -27,6 +27,7 @@ void declareExplain(CommandSyntax& program, Workspace& workspace);
 void declareReplay(CommandSyntax& program);
 void declareDemo(CommandSyntax& program);
 void declareDoctor(CommandSyntax& program, Workspace& workspace);
+void declareWatch(CommandSyntax& program, Workspace& workspace);
 void declareShell(CommandSyntax& program, Workspace& workspace);
 void declareComplete(CommandSyntax& program, Workspace& workspace);
 void declareCompletion(CommandSyntax& program);

@@ -1,0 +1,211 @@
+#include "nidus/Watch/HomeChange.h"
+
+#include <cstddef>
+#include <set>
+#include <unordered_map>
+#include <utility>
+
+#include "PlatformModel/System/NDTextMatching.h"
+#include "nidus/AttributeText.h"
+#include "nidus/HomeEditing/HomeObjects.h"
+#include "nidus/ObjectPath.h"
+
+namespace nidus {
+namespace {
+
+NDDictionaryValue contentOf(const NDValue& value) {
+  if (value.isBoolean()) return NDDictionaryValue(value.boolValue());
+  if (value.isInteger()) return NDDictionaryValue(value.integerValue());
+  if (value.isFloating()) return NDDictionaryValue(value.floatValue());
+  return NDDictionaryValue(value.stringValue());
+}
+
+const char* keyOf(const NDValue& value) {
+  if (value.isBoolean()) return "boolean";
+  if (value.isInteger()) return "integer";
+  return value.isFloating() ? "float" : "string";
+}
+
+/// Null gives the empty dictionary.
+NDDictionary dictionaryOf(const NDValueRef& value) {
+  NDDictionary dictionary;
+  if (value) dictionary.set(keyOf(*value), contentOf(*value));
+  return dictionary;
+}
+
+NDDictionary dictionaryOf(const NDString& text) {
+  return text ? dictionaryOf(NDValue::text(text)) : NDDictionary();
+}
+
+bool isSame(const NDValueRef& a, const NDValueRef& b) { return a && b ? a->isEqual(*b) : !a && !b; }
+
+NDUUID keyOf(const HomeData& home) { return home.uuid; }
+NDUUID keyOf(const AccessoryData& accessory) { return accessory.uuid; }
+std::int64_t keyOf(const ServiceData& service) { return service.instanceID; }
+std::int64_t keyOf(const CharacteristicData& characteristic) { return characteristic.instanceID; }
+
+/// Calls `visit` with each object of two lists: with both of its states, or with null for the one
+/// that it does not have.
+template <class Object, class Visit>
+void forEachPair(const std::vector<Object>& before, const std::vector<Object>& after,
+                 const Visit& visit) {
+  std::unordered_map<decltype(keyOf(before.front())), const Object*> earlier;
+  for (const Object& object : before) earlier.emplace(keyOf(object), &object);
+  for (const Object& object : after) {
+    const auto found = earlier.find(keyOf(object));
+    visit(found == earlier.end() ? nullptr : found->second, &object);
+    if (found != earlier.end()) earlier.erase(found);
+  }
+  for (const Object& object : before) {
+    if (earlier.count(keyOf(object)) > 0) visit(&object, nullptr);
+  }
+}
+
+/// Compares two states of the homes.
+class Comparison {
+ public:
+  explicit Comparison(const MetadataMapper& metadata) : metadata_(metadata) {}
+
+  std::vector<HomeChange> run(const std::vector<HomeData>& before,
+                              const std::vector<HomeData>& after) {
+    forEachPair(before, after,
+                [this](const HomeData* old, const HomeData* now) { compareHomes(old, now); });
+    return std::move(changes_);
+  }
+
+ private:
+  /// Appends a change of the object that `place_` says.
+  HomeChange& add(HomeChange::Kind kind) {
+    HomeChange& change = changes_.emplace_back(place_);
+    change.kind = kind;
+    return change;
+  }
+
+  void addValues(std::string attribute, NDDictionary before, NDDictionary after) {
+    HomeChange& change = add(HomeChange::Kind::changed);
+    change.attribute = std::move(attribute);
+    change.before = std::move(before);
+    change.after = std::move(after);
+  }
+
+  void compareTexts(const char* attribute, const NDString& before, const NDString& after) {
+    if (before == after) return;
+    addValues(attribute, dictionaryOf(before), dictionaryOf(after));
+  }
+
+  /// Whether the object was and is there; tells when it was or is not.
+  bool isThere(const void* old, const void* now) {
+    if (!old) add(HomeChange::Kind::added);
+    if (!now) add(HomeChange::Kind::removed);
+    return old && now;
+  }
+
+  void compareHomes(const HomeData* old, const HomeData* now) {
+    place_ = HomeChange();
+    place_.home = (now ? now : old)->name;
+    if (!isThere(old, now)) return;
+    compareTexts("name", old->name, now->name);
+    forEachPair(old->accessories, now->accessories,
+                [&](const AccessoryData* oldOne, const AccessoryData* nowOne) {
+                  compareAccessories({*old, oldOne}, {*now, nowOne});
+                  place_.accessory = nullptr;
+                  place_.room = nullptr;
+                });
+  }
+
+  /// An accessory, null where there is none, and its home.
+  struct PlacedAccessory {
+    const HomeData& home;
+    const AccessoryData* data;
+    [[nodiscard]] NDString room() const { return roomNameOf(home, *data); }
+  };
+
+  void compareAccessories(const PlacedAccessory& old, const PlacedAccessory& now) {
+    const PlacedAccessory& known = now.data ? now : old;
+    place_.room = known.room();
+    place_.accessory = known.data->name;
+    if (!isThere(old.data, now.data)) return;
+    compareTexts("name", old.data->name, now.data->name);
+    if (old.data->room != now.data->room) compareTexts("room", old.room(), now.room());
+    if (old.data->reachable != now.data->reachable) {
+      addValues("reachable", dictionaryOf(NDValue::boolean(old.data->reachable)),
+                dictionaryOf(NDValue::boolean(now.data->reachable)));
+    }
+    forEachPair(old.data->services, now.data->services,
+                [this](const ServiceData* oldOne, const ServiceData* nowOne) {
+                  compareServices(oldOne, nowOne);
+                  place_.service = nullptr;
+                });
+  }
+
+  void compareServices(const ServiceData* old, const ServiceData* now) {
+    const NDString& name = (now ? now : old)->name;
+    place_.service = name ? name : NDString("(no name)");
+    if (!isThere(old, now)) return;
+    compareTexts("name", old->name, now->name);
+    forEachPair(old->characteristics, now->characteristics,
+                [this](const CharacteristicData* oldOne, const CharacteristicData* nowOne) {
+                  compareValues(oldOne, nowOne);
+                });
+  }
+
+  void compareValues(const CharacteristicData* old, const CharacteristicData* now) {
+    if (isSame(old ? old->value : nullptr, now ? now->value : nullptr)) return;
+    const NDString& type = (now ? now : old)->characteristicType;
+    addValues(attributeText(type, metadata_), valueOf(old), valueOf(now));
+  }
+
+  /// The value as the assistant has it, and the unit of the device.
+  [[nodiscard]] NDDictionary valueOf(const CharacteristicData* data) const {
+    if (!data || !data->value) return {};
+    const NDString& type = data->characteristicType;
+    const NDValueRef value = metadata_.mapToAssistantCharacteristicValue_name(data->value, type);
+    NDDictionary dictionary = dictionaryOf(value);
+    const bool hasOwnUnit = data->metadata && data->metadata->units;
+    const NDString unit =
+        hasOwnUnit ? data->metadata->units : metadata_.characteristicValueUnit(type);
+    const NDString unitName = metadata_.mapToAssistantUnitName(unit);
+    if (value->isNumber()) dictionary.setIfPresent("units", unitName ? unitName : unit);
+    return dictionary;
+  }
+
+  const MetadataMapper& metadata_;
+  HomeChange place_;  ///< Where the comparison is.
+  std::vector<HomeChange> changes_;
+};
+
+bool fits(const std::string& wanted, const NDString& name) {
+  return wanted.empty() || (name && isEqualIgnoringDiacritics(wanted, name.view()));
+}
+
+}  // namespace
+
+std::vector<HomeChange> changesBetween(const std::vector<HomeData>& before,
+                                       const std::vector<HomeData>& after,
+                                       const MetadataMapper& metadata) {
+  return Comparison(metadata).run(before, after);
+}
+
+bool isWatched(const HomeChange& change, const WatchFilter& filter) {
+  return (filter.home.empty() || change.home == std::string_view(filter.home)) &&
+         fits(filter.room, change.room) && fits(filter.service, change.service);
+}
+
+std::string extentOf(const std::vector<HomeData>& homes, const WatchFilter& filter) {
+  std::size_t services = 0;
+  std::set<NDUUID> homesOfServices;
+  forEachService(
+      homes, [&](const HomeData& home, const AccessoryData& accessory, const ServiceData& service) {
+        HomeChange place;
+        place.home = home.name;
+        place.room = roomNameOf(home, accessory);
+        place.service = service.name;
+        if (!isWatched(place, filter)) return;
+        ++services;
+        homesOfServices.insert(home.uuid);
+      });
+  return counted(services, ObjectKind::service) + " of " +
+         counted(homesOfServices.size(), ObjectKind::home);
+}
+
+}  // namespace nidus
