@@ -1,6 +1,7 @@
 #include "nidus/HomeWords.h"
 
 #include "nidus/Answers/ValueText.h"
+#include "nidus/AttributeText.h"
 
 namespace nidus {
 namespace {
@@ -27,10 +28,7 @@ std::string HomeWords::serviceTypeOf(const NDString& type) const {
 }
 
 std::string HomeWords::attributeOf(const NDString& type) const {
-  const NDString name = metadata_->mapToAssistantCharacteristicName(type);
-  if (!name) return type.str();
-  const NDString readType = metadata_->mapReadCharcteristicFromAssistantName(name);
-  return !readType || readType == type ? name.str() : name.str() + " target";
+  return attributeText(type, *metadata_);
 }
 
 std::string HomeWords::valueOf(const CharacteristicData& characteristic,

@@ -23,14 +23,17 @@ void checkPrimary(const std::vector<HomeData>& homes, Findings& findings) {
   const auto isPrimary = [](const HomeData& home) { return home.primary; };
   const auto count = std::count_if(homes.begin(), homes.end(), isPrimary);
   if (count == 1) return;
-  std::string message = "none is the primary one: an order that names no home is for all of them";
-  if (count > 1) {
-    const auto first = std::find_if(homes.begin(), homes.end(), isPrimary);
-    message = "several are primary: an order that names none of them is for the first, " +
-              first->name.str();
+  const std::string remedy = "mark one as primary with nidus home edit";
+  if (count == 0) {
+    findings.push_back({Severity::attention, "homes",
+                        "none is the primary one: an order that names no home fails", remedy});
+    return;
   }
-  findings.push_back(
-      {Severity::note, "homes", message, "mark one as primary with nidus home edit"});
+  const auto first = std::find_if(homes.begin(), homes.end(), isPrimary);
+  findings.push_back({Severity::note, "homes",
+                      "several are primary: an order that names none of them is for the first, " +
+                          first->name.str(),
+                      remedy});
 }
 
 }  // namespace

@@ -164,10 +164,13 @@ TEST_F(HomesCheckTest, FindsHomesThatTheAssistantDoesNotSee) {
   }
 }
 
-TEST_F(HomesCheckTest, NotesMissingAndFurtherPrimaryHomes) {
+TEST_F(HomesCheckTest, FindsHomesWithoutAPrimaryOne) {
   setHomes("[" + home("Cottage", "1", false) + "," + home("Flat", "2", false) + "]");
   EXPECT_THAT(findingsOf(checkHomes),
-              ElementsAre(IsNote("homes", HasSubstr("none is the primary"))));
+              ElementsAre(NeedsAttention("homes", HasSubstr("mark one as primary"))));
+}
+
+TEST_F(HomesCheckTest, NotesFurtherPrimaryHomes) {
   setHomes("[" + home("Cottage", "1", true) + "," + home("Flat", "2", true) + "]");
   EXPECT_THAT(findingsOf(checkHomes), ElementsAre(IsNote("homes", HasSubstr("first, Cottage"))));
 }
