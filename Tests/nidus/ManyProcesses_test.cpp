@@ -77,7 +77,7 @@ class LampUser {
   std::string perform(const std::string& action) {
     const auto begin = Clock::now();
     process_.write(commandLine(number_, action));
-    const std::string reply = process_.readLine().value_or("no reply");
+    std::string reply = process_.readLine().value_or("no reply");
     longestWait_ = std::max(longestWait_, Clock::now() - begin);
     EXPECT_THAT(reply, testing::HasSubstr("COMMAND_SUCCESS"));
     EXPECT_THAT(reply, testing::HasSubstr(R"("outcome": "SUCCESS")"));

@@ -9,8 +9,6 @@
 namespace nidus {
 namespace {
 
-using ::testing::HasSubstr;
-
 ProgramStart shell(const std::string& script) {
   return {.arguments = {"-c", script}, .program = "/bin/sh"};
 }
@@ -33,7 +31,10 @@ TEST(TerminalProcessTest, WaitsForEachTextInItsTurn) {
 
 TEST(TerminalProcessTest, EndsAProgramThatNobodyFinishes) {
   const TestFolder folder;
-  TerminalProcess(shell("echo ready; read answer; echo later > " + folder.file("trace")));
+  {
+    const TerminalProcess terminal(
+        shell("echo ready; read answer; echo later > " + folder.file("trace")));
+  }
   EXPECT_FALSE(std::filesystem::exists(folder.file("trace")));
 }
 

@@ -45,9 +45,9 @@ NameSakes<Object> namedOf(const HomeData& home, const std::vector<Object>& objec
 }
 
 /// Orders find homes and groups by the very name.
-const auto exactName = [](const auto& object) { return object.name.str(); };
+const auto kExactName = [](const auto& object) { return object.name.str(); };
 /// Orders find all else whatever its accents are.
-const auto plainName = [](const auto& object) { return withoutDiacritics(object.name.view()); };
+const auto kPlainName = [](const auto& object) { return withoutDiacritics(object.name.view()); };
 
 /// "the rooms Cottage / Café and Cottage / Cafe".
 template <class Object>
@@ -79,7 +79,7 @@ void checkHomeNames(const std::vector<HomeData>& homes, Findings& findings) {
   }
   const auto primary =
       std::find_if(homes.begin(), homes.end(), [](const HomeData& home) { return home.primary; });
-  for (const auto& list : sharing(all, exactName)) {
+  for (const auto& list : sharing(all, kExactName)) {
     const bool hasPrimary = primary != homes.end() && primary->name == list.front().object->name;
     add(findings, list, "home",
         hasPrimary ? "an order that names it is for the primary one alone"
@@ -95,7 +95,7 @@ void checkRoomNames(const std::vector<HomeData>& homes, Findings& findings) {
     for (const auto& room : namedOf(home, home.rooms)) all.push_back(room);
   }
   const bool hasPrimary = primaryOf(homes) != homes.end();
-  for (const auto& list : sharing(all, plainName)) {
+  for (const auto& list : sharing(all, kPlainName)) {
     const std::string times = std::to_string(list.size()) + " times";
     add(findings, list, "room",
         "an order for it names each of its objects " + times +
@@ -152,7 +152,7 @@ NameSakes<ServicePlace> servicesOf(const HomeData& home, std::vector<ServicePlac
 /// Services of one name get in each other's way where one order can mean several of them.
 void checkServiceNames(const HomeData& home, Findings& findings) {
   std::vector<ServicePlace> places;
-  for (const auto& list : sharing(servicesOf(home, places), plainName)) {
+  for (const auto& list : sharing(servicesOf(home, places), kPlainName)) {
     const ServicePlace& first = *list.front().object;
     const bool areAlike = std::all_of(list.begin() + 1, list.end(), [&first](const auto& named) {
       return shareAttribute(*first.service, *named.object->service);
@@ -176,14 +176,14 @@ void checkNames(const Examination& examination, Findings& findings) {
   checkRoomNames(homes, findings);
   for (const HomeData& home : homes) {
     checkRoomsNamedLikeHome(home, findings);
-    for (const auto& list : sharing(namedOf(home, home.zones), plainName)) {
+    for (const auto& list : sharing(namedOf(home, home.zones), kPlainName)) {
       add(findings, list, "zone", "an order for one is for the rooms of all of them");
     }
-    for (const auto& list : sharing(namedOf(home, home.serviceGroups), exactName)) {
+    for (const auto& list : sharing(namedOf(home, home.serviceGroups), kExactName)) {
       add(findings, list, "group", "an order for one is for the services of all of them");
     }
     checkServiceNames(home, findings);
-    for (const auto& list : sharing(namedOf(home, home.actionSets), plainName)) {
+    for (const auto& list : sharing(namedOf(home, home.actionSets), kPlainName)) {
       add(findings, list, "scene", "only the first of them can be run by its name");
     }
   }

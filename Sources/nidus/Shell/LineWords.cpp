@@ -29,11 +29,10 @@ class LineReader {
 
  private:
   void read(char c) {
-    if (quote == '\'') {
-      readLiterally(c);
-    } else if (c == '\\') {
+    const bool isBackslash = c == '\\' && quote != '\'';
+    if (isBackslash) {
       readBackslash();
-    } else if (quote == '"') {
+    } else if (quote != 0) {
       readLiterally(c);
     } else if (isIn(c, kWhiteSpace)) {
       isInWord = false;

@@ -21,7 +21,7 @@ PreferenceReport reported(const char* key, const std::map<std::string, JsonValue
   options.drainsOnCaller = true;
   options.preferences = preferences;
   const auto platform = HomePlatform::open(std::move(options));
-  const PreferenceReport report = reportOn(*findPreferenceKey(key), **platform, threshold);
+  PreferenceReport report = reportOn(*findPreferenceKey(key), **platform, threshold);
   (*platform)->shutDown();
   return report;
 }
