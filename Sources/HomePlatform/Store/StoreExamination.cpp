@@ -72,8 +72,8 @@ class Look {
     Statement row(database_,
                   "SELECT \"table\", count(*) FROM pragma_foreign_key_check GROUP BY 1 ORDER BY 1");
     while (row.step()) {
-      addDamage("references of the table " + std::string(row.text(0)) + " that lead nowhere: " +
-                std::to_string(row.integer(1)));
+      addDamage("references of the table " + std::string(row.text(0)) +
+                " that lead nowhere: " + std::to_string(row.integer(1)));
     }
   }
 

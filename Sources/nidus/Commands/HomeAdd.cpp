@@ -105,8 +105,8 @@ void declareService(AdditionSyntax& add) {
       [](Homes& homes, const AdditionWords& words, const HomeWording& wording) {
         ServiceWords named = words.service;
         named.name = words.object.name;
-        return addService(homes, {ObjectKind::accessory, words.accessory, words.object.home},
-                          named, wording.vocabulary);
+        return addService(homes, {ObjectKind::accessory, words.accessory, words.object.home}, named,
+                          wording.vocabulary);
       });
   AdditionWords& words = add.words();
   service.requiredOption("--accessory", "ACCESSORY", words.accessory, "What it is a service of");
