@@ -64,13 +64,13 @@ std::string namesOf(const NDDictionaryList& records) {
 }
 
 std::string enumeration(const std::vector<std::string>& texts) {
-  constexpr std::size_t kGreatestCount = 12;
+  constexpr std::size_t kUsualCount = 12;
+  // The name of a single one takes no more room than that there is one more.
+  const std::size_t count = texts.size() > kUsualCount + 1 ? kUsualCount : texts.size();
   std::string text;
-  for (std::size_t i = 0; i < texts.size() && i < kGreatestCount; ++i) {
-    text += (i == 0 ? "" : ", ") + onOneLine(texts[i]);
-  }
-  if (texts.size() <= kGreatestCount) return text;
-  return text + " and " + std::to_string(texts.size() - kGreatestCount) + " more";
+  for (std::size_t i = 0; i < count; ++i) text += (i == 0 ? "" : ", ") + onOneLine(texts[i]);
+  if (count == texts.size()) return text;
+  return text + " and " + std::to_string(texts.size() - count) + " more";
 }
 
 }  // namespace nidus

@@ -74,6 +74,16 @@ TEST(NameHintTest, SuggestsANearMiss) {
   EXPECT_EQ(nameHint("room", "Hal", {}), "There is no room Hal here.\n");
 }
 
+TEST(NameHintTest, SuggestsWhatIsWrittenWithAccents) {
+  EXPECT_EQ(nameHint("scene", "soiree", {"Night", "Soirée"}),
+            "There is no scene soiree here; did you mean Soirée? There are: Night, Soirée.\n");
+}
+
+TEST(RecordsTest, NamesTheLastOneLeft) {
+  EXPECT_EQ(enumeration(std::vector<std::string>(13, "x")),
+            "x, x, x, x, x, x, x, x, x, x, x, x, x");
+}
+
 TEST(RecordsTest, ShortensLongLists) {
   std::vector<std::string> texts(14, "x");
   EXPECT_EQ(enumeration(texts), "x, x, x, x, x, x, x, x, x, x, x, x and 2 more");

@@ -20,6 +20,14 @@ TEST(NearMissTest, FindsTheNearestWord) {
   }
 }
 
+TEST(NearMissTest, PassesOverAccentsAndCase) {
+  const std::vector<std::string_view> known = {"Study", "Café Corner", "Soirée", "Élan"};
+  EXPECT_EQ(nearMiss("soiree", known), "Soirée");
+  EXPECT_EQ(nearMiss("cafe corner", known), "Café Corner");
+  EXPECT_EQ(nearMiss("CAFE CORNR", known), "Café Corner");
+  EXPECT_EQ(nearMiss("élna", known), "Élan");
+}
+
 TEST(NearMissTest, KnowsNoWordAmongNone) { EXPECT_EQ(nearMiss("HEAT", {}), ""); }
 
 }  // namespace
