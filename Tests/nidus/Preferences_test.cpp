@@ -50,6 +50,13 @@ TEST_F(PreferencesCommandTest, GetsOne) {
               StartsWith(R"({"key": "InternalBuild", "value": null, )"));
 }
 
+TEST_F(PreferencesCommandTest, TellsThatEditsSetWhetherToLook) {
+  ASSERT_EQ(run({"home", "add", "home", "Cabin"}).exitStatus, 0);
+  EXPECT_THAT(run({"preferences", "get", "kHomesConfigured"}).output,
+              AllOf(StartsWith("kHomesConfigured: true\n"),
+                    HasSubstr("each import and each edit of homes sets it.\n")));
+}
+
 TEST_F(PreferencesCommandTest, SetsAndTellsTheEffect) {
   const ProgramEnd end = run({"preferences", "set", "NidusLogLevel", "debug"});
   EXPECT_EQ(end.exitStatus, 0);

@@ -48,7 +48,7 @@ const std::vector<PreferenceKey>& preferenceKeys() {
   using Kind = PreferenceKey::Kind;
   static const std::vector<PreferenceKey> kKeys = {
       {Preferences::kHomesConfigured, Kind::flag,
-       "Whether the plug-in looks for homes at all; an import sets it."},
+       "Whether the plug-in looks for homes at all; each import and each edit of homes sets it."},
       {"NidusLogLevel", Kind::level,
        "Which messages are logged, up to which level; counts from 3 on."},
       {"NidusDeveloperLogLevel", Kind::level,
@@ -101,8 +101,10 @@ std::string expectationOf(const PreferenceKey& key) {
 std::string levelText(std::int64_t level) {
   std::string number = std::to_string(level);
   if (level < 0) return number;
-  const auto known = std::min(static_cast<std::size_t>(level), kLevelNames.size() - 1);
-  return number + " (" + std::string(kLevelNames.at(known)) + ')';
+  const std::size_t last = kLevelNames.size() - 1;
+  const auto known = static_cast<std::size_t>(level);
+  if (known <= last) return number + " (" + std::string(kLevelNames.at(known)) + ')';
+  return number + " (as " + std::to_string(last) + ", " + std::string(kLevelNames.at(last)) + ')';
 }
 
 }  // namespace nidus

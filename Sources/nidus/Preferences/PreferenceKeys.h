@@ -40,7 +40,8 @@ struct PreferenceKey {
 /// What `key` takes: "true or false".
 [[nodiscard]] std::string expectationOf(const PreferenceKey& key);
 
-/// A log level with its name: "4 (warning)".
+/// A log level with its name, "4 (warning)"; one beyond the last says what it counts as, "99 (as 7,
+/// debug)".
 [[nodiscard]] std::string levelText(std::int64_t level);
 
 }  // namespace nidus

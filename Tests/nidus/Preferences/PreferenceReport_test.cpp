@@ -79,7 +79,8 @@ TEST(PreferenceKeysTest, TellsWhatTheyTake) {
 TEST(PreferenceKeysTest, NamesLevels) {
   EXPECT_EQ(levelText(0), "0 (emergency)");
   EXPECT_EQ(levelText(4), "4 (warning)");
-  EXPECT_EQ(levelText(9), "9 (debug)");
+  EXPECT_EQ(levelText(7), "7 (debug)");
+  EXPECT_EQ(levelText(9), "9 (as 7, debug)");
   EXPECT_EQ(levelText(-1), "-1");
 }
 
