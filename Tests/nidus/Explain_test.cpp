@@ -141,6 +141,12 @@ TEST_F(ExplainTest, TakesLimitsFromTheHomesAlone) {
   EXPECT_THAT(text, HasSubstr("1 light with limits\n"));
 }
 
+TEST_F(ExplainTest, TellsThatNothingReachedStatesLimits) {
+  const std::string text = explained({"limits", "power", "--service", "Lamp"});
+  EXPECT_THAT(text, HasSubstr("there is no result.\nOf what is reached, only what states a "
+                              "minimum of its own gives a result.\n"));
+}
+
 TEST_F(ExplainTest, TakesACommandFromAnywhere) {
   const std::string command = readCommandLine("Lamp");
   const std::string text = explained({"--command", command});
@@ -178,7 +184,7 @@ TEST_F(ExplainTest, TellsWhyNoStepRan) {
   import(documentOf({emptyHome("One", 1), emptyHome("Two", 2)}));
   EXPECT_THAT(explained({"get", "power"}), HasSubstr("there are several homes, the filter names"));
   ASSERT_EQ(run({"preferences", "set", "kHomesConfigured", "false"}).exitStatus, 0);
-  EXPECT_THAT(explained({"get", "power"}), HasSubstr("The plug-in does not look for homes; see"));
+  EXPECT_THAT(explained({"get", "power"}), HasSubstr("The plug-in does not look for homes, as"));
   import(documentOf({}));
   EXPECT_THAT(explained({"get", "power"}), HasSubstr("There are no homes yet; import some"));
 }
@@ -210,6 +216,9 @@ TEST_F(ExplainTest, RefusesBadInput) {
       {{"explain"}, "explain takes either an order"},
       {{"explain", "get", "power", "--command", "{}"}, "explain takes either an order"},
       {{"explain", "dance"}, "dance: an order begins with"},
+      {{"explain", "get power --room Kitchen"},
+       "get power --room Kitchen: write the order without quotes around the whole"},
+      {{"explain", "dance on"}, "dance on: an order begins with"},
       {{"explain", "get", "powr"}, "powr: did you mean POWER?"},
       {{"explain", "--command", "{\"filters\": 1}"}, "--command: /filters: "},
       {{"explain", "--command", "/nowhere.json"}, "/nowhere.json: "},

@@ -11,6 +11,7 @@ using ::testing::ContainsRegex;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 using ::testing::Not;
+using ::testing::StartsWith;
 
 /// Gives orders for the demonstration home.
 class OrdersTest : public ProgramTest {
@@ -238,6 +239,37 @@ TEST_F(OrdersTest, CanSayNothingOnATerminal) {
   const ProgramEnd end = runOnTerminal(start({"set", "power", "off", "--quiet"}));
   EXPECT_EQ(end.exitStatus, 0);
   EXPECT_THAT(end.output, IsEmpty());
+}
+
+using MissingHomesTest = ProgramTest;
+
+TEST_F(MissingHomesTest, SaysHowToBeginWithoutHomes) {
+  for (const std::vector<std::string>& order :
+       {std::vector<std::string>{"get", "power"}, {"limits", "hue"}, {"run", "Night"}}) {
+    const ProgramEnd end = run(order);
+    EXPECT_EQ(end.exitStatus, 1);
+    EXPECT_THAT(end.output,
+                AllOf(StartsWith("There are no homes yet; "), HasSubstr("nidus home import FILE"),
+                      HasSubstr("nidus demo --home"), HasSubstr("nidus home add home NAME")));
+    EXPECT_THAT(end.errors, IsEmpty());
+  }
+}
+
+TEST_F(MissingHomesTest, SaysThatHomesAreNotLookedFor) {
+  importSmallHome();
+  ASSERT_EQ(run({"preferences", "set", "kHomesConfigured", "false"}).exitStatus, 0);
+  const ProgramEnd end = run({"set", "power", "on"});
+  EXPECT_EQ(end.exitStatus, 1);
+  EXPECT_EQ(end.output,
+            "The plug-in does not look for homes, as kHomesConfigured is not true; change that "
+            "with nidus preferences set kHomesConfigured true\n");
+}
+
+TEST_F(MissingHomesTest, LeavesTheRepliesAndOtherReasonsAlone) {
+  EXPECT_THAT(run({"get", "power", "--json"}).output, StartsWith("{\"commandOutcome\""));
+  EXPECT_THAT(run({"get", "power", "--quiet"}).output, IsEmpty());
+  importSmallHome();
+  EXPECT_THAT(run({"get", "power", "--room", "Attic"}).output, StartsWith("Nothing matches; "));
 }
 
 /// Two lamps whose brightness has different limits.

@@ -104,7 +104,17 @@ std::string limitsText(const Order& order, const std::vector<Replies>& replies,
          outcomeSentence(order, jointReply(forms, objects), vocabulary) + '\n';
 }
 
+bool isWithoutMatch(const NDDictionary& reply) {
+  return replyForm(reply).outcome == VAHACommandOutcomeFOUND_NO_MATCHING_ENTITIESValue;
+}
+
 }  // namespace
+
+bool isAllWithoutMatch(const std::vector<Replies>& replies) {
+  return std::all_of(replies.begin(), replies.end(), [](const Replies& ofCommand) {
+    return std::all_of(ofCommand.begin(), ofCommand.end(), isWithoutMatch);
+  });
+}
 
 std::string answerText(const Order& order, const std::vector<Replies>& replies,
                        const Vocabulary& vocabulary, const TerminalStyle& style) {

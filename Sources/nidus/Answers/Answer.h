@@ -13,6 +13,9 @@ namespace nidus {
 /// The replies to one command, in the order in which they came; empty when there was none.
 using Replies = std::vector<NDDictionary>;
 
+/// Whether all that the plug-in replied is that nothing matches.
+[[nodiscard]] bool isAllWithoutMatch(const std::vector<Replies>& replies);
+
 /// Shows the answer to an order to a person: for each reply a table of the objects and one sentence
 /// about the outcome, in whole lines. `replies` has one entry for each command of the order; the
 /// vocabulary gives values their words and units. A reply that asks for an unlocked device comes

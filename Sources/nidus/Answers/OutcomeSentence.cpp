@@ -9,6 +9,7 @@
 
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "nidus/Answers/ValueText.h"
+#include "nidus/Orders/OrderValue.h"
 
 namespace nidus {
 namespace {
@@ -114,6 +115,18 @@ std::vector<std::string> troublesOf(const Results& results) {
   return troubles;
 }
 
+/// Where to look when devices refused a number; empty for another order.
+std::string limitsHint(const Order& order, const Vocabulary& vocabulary) {
+  if (order.kind != Order::Kind::set) return {};
+  const auto& entries = vocabulary.characteristics;
+  const bool isNumber =
+      std::any_of(entries.begin(), entries.end(), [&order](const CharacteristicEntry& entry) {
+        return entry.assistantName.view() == order.attribute && isNumeric(entry);
+      });
+  if (!isNumber) return {};
+  return "; the value may be beyond the limits, see nidus limits " + order.attribute;
+}
+
 std::string sentenceOf(const Order& order, const Results& results, const Vocabulary& vocabulary) {
   const Results done = withOutcome(results, VAHAActionOutcomeSUCCESSValue);
   std::string sentence =
@@ -124,7 +137,8 @@ std::string sentenceOf(const Order& order, const Results& results, const Vocabul
     sentence +=
         ", " + std::to_string(those.size()) + ' ' + outcomeWord(trouble) + ": " + namesOf(those);
   }
-  return sentence;
+  const bool hasFailed = !withOutcome(results, VAHAActionOutcomeFAILUREValue).empty();
+  return hasFailed ? sentence + limitsHint(order, vocabulary) : sentence;
 }
 
 std::string noMatchSentence(const Order& order, const Vocabulary& vocabulary) {
@@ -133,7 +147,7 @@ std::string noMatchSentence(const Order& order, const Vocabulary& vocabulary) {
     return "Nothing matches whose " + questionOf(order, vocabulary) + kRemedy;
   }
   const bool isLimits = order.kind == Order::Kind::limits;
-  return std::string(isLimits ? "Nothing matches that has limits" : "Nothing matches") + kRemedy;
+  return std::string(isLimits ? "Nothing with limits matches" : "Nothing matches") + kRemedy;
 }
 
 }  // namespace

@@ -6,7 +6,6 @@
 
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "nidus/Answers/Answer.h"
-#include "nidus/Answers/ReplyForm.h"
 #include "nidus/Explain/ActionText.h"
 #include "nidus/Explain/FilterText.h"
 #include "nidus/Explain/HomeIndex.h"
@@ -69,10 +68,6 @@ std::string wholeActionText(const VAHACommand& command, const Rehearsal& rehears
          actionText(rehearsal, HomeIndex(stage.homes()), HomeWords(platform), style);
 }
 
-bool isNoMatch(const NDDictionary& reply) {
-  return replyForm(reply).outcome == VAHACommandOutcomeFOUND_NO_MATCHING_ENTITIESValue;
-}
-
 std::vector<Replies> repliesOf(const Explanation& explanation) {
   std::vector<Replies> replies;
   for (const Rehearsal& rehearsal : explanation.rehearsals) replies.push_back(rehearsal.replies);
@@ -83,10 +78,8 @@ std::vector<Replies> repliesOf(const Explanation& explanation) {
 std::string wholeAnswerText(const Explanation& explanation, const Vocabulary& vocabulary,
                             const TerminalStyle& style) {
   const std::vector<Replies> replies = repliesOf(explanation);
-  const bool hasContent = std::any_of(replies.begin(), replies.end(), [](const Replies& each) {
-    return !std::all_of(each.begin(), each.end(), isNoMatch);
-  });
-  return hasContent ? answerText(explanation.order, replies, vocabulary, style) : "";
+  return isAllWithoutMatch(replies) ? ""
+                                    : answerText(explanation.order, replies, vocabulary, style);
 }
 
 constexpr const char kFooter[] =

@@ -8,7 +8,7 @@
 #include "nidus/Answers/ReplyForm.h"
 #include "nidus/Explain/NameHint.h"
 #include "nidus/Explain/Records.h"
-#include "nidus/Preferences/PreferenceReport.h"
+#include "nidus/MissingHomes.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Terminal/TextTable.h"
 
@@ -137,12 +137,8 @@ bool isRefused(const Rehearsal& rehearsal) {
 
 /// Why no step ran.
 std::string noStepText(const Filter* filter, const Rehearsal& rehearsal, HomePlatform& platform) {
-  if (rehearsal.after.empty()) {
-    return "There are no homes yet; import some with nidus home import FILE.\n";
-  }
-  if (!areHomesConfigured(platform)) {
-    return "The plug-in does not look for homes; see nidus preferences get kHomesConfigured.\n";
-  }
+  const std::string missing = missingHomesText(!rehearsal.after.empty(), platform);
+  if (!missing.empty()) return missing + ".\n";
   if (!filter) return "Nothing is found: only a filter that searches finds objects.\n";
   if (isRefused(rehearsal)) {
     return "It did not run: there are several homes, the filter names none, and none is the "

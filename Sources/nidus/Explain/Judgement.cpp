@@ -64,6 +64,25 @@ bool isQuestion(const VAHACommand& command) {
   return isGet && action.value();
 }
 
+/// The limit that a command asks for; empty when it asks for none.
+std::string_view limitAskedBy(const VAHACommand& command) {
+  if (command.actions().empty()) return {};
+  const NDString& type = command.actions().front()->actionType();
+  if (type == VAHAActionTypeGET_MINIMUMValue) return "minimum";
+  if (type == VAHAActionTypeGET_MAXIMUMValue) return "maximum";
+  return type == VAHAActionTypeGET_STEP_VALUEValue ? "step" : "";
+}
+
+/// Why not all that was reached gives a result, for commands that leave some out.
+std::string omissionText(const VAHACommand& command) {
+  if (isQuestion(command)) {
+    return "Of what is read, only what has the value that was asked for gives a result.\n";
+  }
+  const std::string limit(limitAskedBy(command));
+  if (limit.empty()) return {};
+  return "Of what is reached, only what states a " + limit + " of its own gives a result.\n";
+}
+
 /// What the plug-in logs as a warning or worse.
 std::string warningLines(const Rehearsal& rehearsal) {
   constexpr std::string_view kWarning = "4";
@@ -86,10 +105,7 @@ std::string judgementText(const VAHACommand& command, const Rehearsal& rehearsal
     const ReplyForm form = replyForm(reply);
     text += lineOf(kReplyReasons, form.outcome) + resultLines(form);
   }
-  if (isQuestion(command) && !rehearsal.reached.empty()) {
-    text += "Of what is read, only what has the value that was asked for gives a result.\n";
-  }
-  return text;
+  return rehearsal.reached.empty() ? text : text + omissionText(command);
 }
 
 }  // namespace nidus

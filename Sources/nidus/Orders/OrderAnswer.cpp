@@ -5,6 +5,7 @@
 
 #include "AssistantHost/JsonLine.h"
 #include "nidus/Answers/Answer.h"
+#include "nidus/MissingHomes.h"
 #include "nidus/Orders/OrderRun.h"
 #include "nidus/StandardStreams.h"
 
@@ -24,15 +25,24 @@ bool isSilent(const std::vector<Replies>& replies) {
                      [](const Replies& ofCommand) { return ofCommand.empty(); });
 }
 
-ExitStatus show(const Order& order, const std::vector<Replies>& replies,
-                const Vocabulary& vocabulary, AnswerForm form) {
+/// Why there was nothing to match, when it is not for the words of the order; else empty.
+std::string missingHomes(const std::vector<Replies>& replies, HomePlatform& platform) {
+  if (!isAllWithoutMatch(replies)) return {};
+  const auto homes = platform.exportHomes();
+  return homes ? missingHomesText(!homes->empty(), platform) : "";
+}
+
+ExitStatus show(const Order& order, const std::vector<Replies>& replies, HomePlatform& platform,
+                AnswerForm form) {
   if (form == AnswerForm::quiet) return ExitStatus::success;
   if (isSilent(replies)) {
     reportLine("the plug-in gave no reply; see why with nidus explain and the same words");
     return ExitStatus::noReply;
   }
   if (form == AnswerForm::json) return printText(jsonLines(replies));
-  return printText(answerText(order, replies, vocabulary, standardOutputStyle()));
+  const std::string missing = missingHomes(replies, platform);
+  if (!missing.empty()) return printText(missing + '\n');
+  return printText(answerText(order, replies, platform.vocabulary(), standardOutputStyle()));
 }
 
 }  // namespace
@@ -43,7 +53,7 @@ ExitStatus answerOrder(Session& session, const OrderWords& words, AnswerForm for
   const auto replies = performOrder(session, *order);
   if (!replies) return report(replies.failure());
   const ExitStatus status = session.statusAfter(statusOf(*order, *replies));
-  return std::max(status, show(*order, *replies, session.platform().vocabulary(), form));
+  return std::max(status, show(*order, *replies, session.platform(), form));
 }
 
 }  // namespace nidus

@@ -54,6 +54,8 @@ class OrderReader {
     Verb read;
   };
   static const std::array<VerbEntry, 7> kVerbs;
+  [[nodiscard]] static const VerbEntry* findVerb(std::string_view name);
+  [[nodiscard]] Failure unknownVerb() const;
 
   Status readGet();
   Status readQuestion();
@@ -73,6 +75,8 @@ class OrderReader {
   }
   [[nodiscard]] bool hasMore() const { return used_ < words_.words.size(); }
   [[nodiscard]] Status refuseMore() const;
+  /// The value that most likely is asked for by what follows the attribute.
+  [[nodiscard]] std::string meantValue() const;
   [[nodiscard]] Failure impossible(const std::string& reason) const;
   void add(std::string_view type, VAHAValueRef value = nullptr) {
     order_.commands.push_back(commandOf(filter_, order_, type, std::move(value)));
@@ -99,14 +103,25 @@ constexpr std::array<OrderReader::VerbEntry, 7> OrderReader::kVerbs = {{
     {"run", &OrderReader::readRun},
 }};
 
-Result<Order> OrderReader::read() {
-  const auto verb = std::find_if(kVerbs.begin(), kVerbs.end(), [this](const VerbEntry& known) {
-    return known.name == words_.verb;
-  });
-  if (verb == kVerbs.end()) {
-    return badInput(words_.verb +
-                    ": an order begins with get, set, raise, lower, toggle, limits or run");
+const OrderReader::VerbEntry* OrderReader::findVerb(std::string_view name) {
+  const auto* found = std::find_if(kVerbs.begin(), kVerbs.end(),
+                                   [name](const VerbEntry& verb) { return verb.name == name; });
+  return found == kVerbs.end() ? nullptr : found;
+}
+
+Failure OrderReader::unknownVerb() const {
+  const std::string& given = words_.verb;
+  const std::size_t end = given.find(' ');
+  if (end != std::string::npos && findVerb(given.substr(0, end))) {
+    return badInput(given + ": write the order without quotes around the whole");
   }
+  return badInput(shownWord(given) +
+                  ": an order begins with get, set, raise, lower, toggle, limits or run");
+}
+
+Result<Order> OrderReader::read() {
+  const VerbEntry* verb = findVerb(words_.verb);
+  if (!verb) return unknownVerb();
   auto filter = searchFilter(words_.filter, vocabulary_);
   if (!filter) return filter.failure();
   filter_ = std::move(*filter);
@@ -165,11 +180,21 @@ Status OrderReader::readGet() {
   return std::nullopt;
 }
 
+std::string OrderReader::meantValue() const {
+  const auto& words = words_.words;
+  for (std::size_t first = used_; first < words.size(); ++first) {
+    const std::string text = joined(words, first, words.size());
+    if (values_.read(text, *entry_, ValueUse::question)) return text;
+  }
+  return "VALUE";
+}
+
 Status OrderReader::readQuestion() {
   order_.kind = Order::Kind::ask;
   const std::string order = "get " + order_.attribute;
   if (words_.words[used_] != "is") {
-    return badInput(rest() + ": to ask which objects have it, write " + order + " is " + rest());
+    return badInput(rest() + ": to ask which objects have it, write " + order + " is " +
+                    meantValue());
   }
   ++used_;
   if (!hasMore()) return badInput(order + " is: name the value");

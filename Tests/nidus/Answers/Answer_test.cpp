@@ -150,7 +150,7 @@ TEST_F(AnswerTest, CountsWhatHasNoLimitsApart) {
 
 TEST_F(AnswerTest, SaysThatThereAreNoLimits) {
   EXPECT_EQ(answer(orderOf(Order::Kind::limits), {{replyOf({})}, {replyOf({})}, {replyOf({})}}),
-            "Nothing matches that has limits; see why with nidus explain and the same words\n");
+            "Nothing with limits matches; see why with nidus explain and the same words\n");
 }
 
 TEST_F(AnswerTest, SaysOnceThatLimitsWereRefused) {

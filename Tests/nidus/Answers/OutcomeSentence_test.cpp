@@ -65,6 +65,24 @@ TEST_F(OutcomeSentenceTest, NamesWhatDidNotSucceed) {
   }
 }
 
+TEST_F(OutcomeSentenceTest, PointsToTheLimitsOfARefusedNumber) {
+  const ResultSpec failed = {.name = "F", .outcome = "FAILURE"};
+  const SentenceCase table[] = {
+      {orderOf(Order::Kind::set, "BRIGHTNESS"),
+       {{.name = "A"}, failed, unreachable("U")},
+       "1 light set, 1 unreachable: U, 1 failed: F; the value may be beyond the limits, see nidus "
+       "limits BRIGHTNESS"},
+      {orderOf(Order::Kind::set, "BRIGHTNESS"),
+       {unreachable("U")},
+       "No light set, 1 unreachable: U"},
+      {orderOf(Order::Kind::set, "POWER"), {failed}, "No light set, 1 failed: F"},
+      {orderOf(Order::Kind::get, "BRIGHTNESS"), {failed}, "No light read, 1 failed: F"},
+  };
+  for (const SentenceCase& item : table) {
+    EXPECT_EQ(sentence(item.order, replyOf(item.results)), item.sentence);
+  }
+}
+
 struct NounCase {
   std::vector<const char*> types;
   const char* sentence;

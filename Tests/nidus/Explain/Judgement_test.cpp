@@ -56,6 +56,27 @@ TEST(JudgementTest, ShowsWarningsOfTheLogAlone) {
             "COMMAND_FAILURE, because the plug-in refuses the command as it stands.\n");
 }
 
+TEST(JudgementTest, TellsThatOnlyWhatStatesALimitCounts) {
+  const auto judgedLimit = [](const char* type, std::size_t reached) {
+    const auto action = std::make_shared<VAHAAction>();
+    action->setActionType(type);
+    VAHACommand command;
+    command.setActions({action});
+    Rehearsal rehearsal;
+    rehearsal.reached.resize(reached);
+    rehearsal.replies = {reply("FOUND_NO_MATCHING_ENTITIES", {})};
+    return judgementText(command, rehearsal);
+  };
+  const std::string none = "FOUND_NO_MATCHING_ENTITIES, because there is no result.\n";
+  const std::string omission = " of its own gives a result.\n";
+  const std::string start = none + "Of what is reached, only what states a ";
+  EXPECT_EQ(judgedLimit("GET_MINIMUM", 1), start + "minimum" + omission);
+  EXPECT_EQ(judgedLimit("GET_MAXIMUM", 1), start + "maximum" + omission);
+  EXPECT_EQ(judgedLimit("GET_STEP_VALUE", 1), start + "step" + omission);
+  EXPECT_EQ(judgedLimit("GET_MINIMUM", 0), none);
+  EXPECT_EQ(judgedLimit("SET", 1), none);
+}
+
 TEST(JudgementTest, PassesOverUnknownOutcomes) {
   EXPECT_EQ(judged({reply("SOMETHING_NEW", {"SOMETHING_ELSE"})}), "");
 }

@@ -81,6 +81,8 @@ TEST(OrderReaderTest, RefusesWhatIsNoOrder) {
       {"get xyzzy", "xyzzy: there is no such attribute; see nidus vocabulary"},
       {"set power", "set POWER: name the value"},
       {"get power on", "on: to ask which objects have it, write get POWER is on"},
+      {"get brightness was 3", "was 3: to ask which objects have it, write get BRIGHTNESS is 3"},
+      {"get power somehow", "somehow: to ask which objects have it, write get POWER is VALUE"},
       {"get power is", "get POWER is: name the value"},
       {"get power is on --target",
        "--target: a question compares what is, not what was set; leave one out"},
