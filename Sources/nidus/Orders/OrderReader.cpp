@@ -183,7 +183,7 @@ Status OrderReader::readGet() {
 std::string OrderReader::meantValue() const {
   const auto& words = words_.words;
   for (std::size_t first = used_; first < words.size(); ++first) {
-    const std::string text = joined(words, first, words.size());
+    std::string text = joined(words, first, words.size());
     if (values_.read(text, *entry_, ValueUse::question)) return text;
   }
   return "VALUE";
