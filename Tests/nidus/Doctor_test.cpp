@@ -57,6 +57,25 @@ TEST_F(DoctorTest, MakesNothing) {
   EXPECT_TRUE(std::filesystem::is_empty(data()));
 }
 
+TEST_F(DoctorTest, ListsWhatIsNotThereYet) {
+  std::filesystem::remove_all(data());
+  EXPECT_THAT(report(), AllOf(HasSubstr("note       data folder\n  note       " + data() + ": "),
+                              HasSubstr("note       database\n  note       " + data() + "/home"),
+                              EndsWith("\n1 thing needs attention, with 2 notes.\n")));
+}
+
+TEST_F(DoctorTest, SaysOnceThatThereCanBeNoFolder) {
+  const std::string file = folder_.write("file", "");
+  for (const std::string& folder : {file, file + "/below", std::string("/proc/nidus")}) {
+    const ProgramEnd end = runProgram(ProgramStart{{"--data", folder, "doctor"}});
+    EXPECT_EQ(end.exitStatus, 1);
+    EXPECT_THAT(
+        end.output,
+        AllOf(::testing::StartsWith("attention  data folder\n  attention  " + folder + ": "),
+              Not(HasSubstr("nidus home add")), EndsWith("\n1 thing needs attention.\n")));
+  }
+}
+
 TEST_F(DoctorTest, LeavesTheFolderAsItWas) {
   ASSERT_EQ(run({"doctor"}).exitStatus, 0);
   std::vector<std::string> names;
@@ -115,10 +134,12 @@ TEST_F(DoctorTest, IsHonestAboutTheDemonstrationHome) {
 
 TEST_F(DoctorTest, AdvisesCommandsThatMend) {
   import(documentOf({smallHome()}));
-  ASSERT_THAT(report(), AllOf(HasSubstr("nidus home remove accessory Away\n"),
-                              HasSubstr("nidus home remove scene Night\n")));
-  ASSERT_EQ(run({"home", "remove", "accessory", "Away", "--yes"}).exitStatus, 0);
-  ASSERT_EQ(run({"home", "remove", "scene", "Night", "--yes"}).exitStatus, 0);
+  const std::string away = "DD00DD00-0000-4000-8000-000000000002";
+  const std::string night = "FF00FF00-0000-4000-8000-000000000001";
+  ASSERT_THAT(report(), AllOf(HasSubstr("nidus home remove accessory " + away + "\n"),
+                              HasSubstr("nidus home remove scene " + night + "\n")));
+  ASSERT_EQ(run({"home", "remove", "accessory", away, "--yes"}).exitStatus, 0);
+  ASSERT_EQ(run({"home", "remove", "scene", night, "--yes"}).exitStatus, 0);
   EXPECT_EQ(run({"doctor"}).exitStatus, 0);
 }
 

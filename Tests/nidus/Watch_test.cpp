@@ -86,10 +86,29 @@ TEST_F(WatchTest, PassesOverWhatIsNotAskedFor) {
   endBy(SIGINT, process);
 }
 
+TEST_F(WatchTest, RefusesNamesThatNothingHas) {
+  const ProgramEnd home = run({"watch", "--home", "Cotage"});
+  EXPECT_EQ(home.exitStatus, 2);
+  EXPECT_EQ(home.errors, "nidus: there is no home Cotage; did you mean Cottage?\n");
+  const ProgramEnd room = run({"watch", "--room", "kitchn"});
+  EXPECT_EQ(room.exitStatus, 2);
+  EXPECT_EQ(room.errors, "nidus: there is no room kitchn; did you mean Kitchen?\n");
+}
+
+TEST_F(WatchTest, TellsThatARoomIsRenamed) {
+  ProgramProcess process(watch("--room Kitchen"));
+  begin(process, "2 services of 1 home");
+  ASSERT_EQ(run({"home", "rename", "room", "Kitchen", "Galley"}).exitStatus, 0);
+  EXPECT_THAT(process.readLine().value_or(""),
+              HasSubstr("  Cottage / Galley  name  Kitchen -> Galley"));
+  endBy(SIGINT, process);
+}
+
 TEST_F(WatchTest, WaitsForTheFirstHome) {
   std::filesystem::remove_all(data());
   ProgramProcess process(watch());
-  begin(process, "0 services of 0 homes");
+  begin(process,
+        "for the first home, which nidus home add home NAME or nidus home import FILE adds");
   importSmallHome();
   EXPECT_THAT(process.readLine().value_or(""), HasSubstr("  Cottage  added"));
   endBy(SIGINT, process);

@@ -3,8 +3,11 @@
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include <cerrno>
+#include <cstdlib>
+#include <string>
 #include <system_error>
 
 namespace nidus {
@@ -16,13 +19,17 @@ Failure folderFailure(const std::filesystem::path& folder, const std::string& wh
                                        "; give another data folder or mend its permissions"};
 }
 
+Failure makeFailure(const std::filesystem::path& folder, int error) {
+  return folderFailure(folder, "the data folder cannot be made", error);
+}
+
 Status makeFolder(const std::filesystem::path& folder) {
   std::error_code error;
   const std::filesystem::path parent = std::filesystem::absolute(folder, error).parent_path();
   if (!error) std::filesystem::create_directories(parent, error);
-  if (error) return folderFailure(folder, "the data folder cannot be made", error.value());
+  if (error) return makeFailure(folder, error.value());
   if (::mkdir(folder.c_str(), S_IRWXU) == 0 || errno == EEXIST) return std::nullopt;
-  return folderFailure(folder, "the data folder cannot be made", errno);
+  return makeFailure(folder, errno);
 }
 
 }  // namespace
@@ -39,6 +46,18 @@ Status prepareDataFolder(const std::filesystem::path& folder) {
   }
   if (::access(folder.c_str(), R_OK | W_OK | X_OK) == 0) return std::nullopt;
   return folderFailure(folder, "the data folder cannot be written", errno);
+}
+
+Status tryDataFolder(const std::filesystem::path& folder) {
+  std::error_code error;
+  std::filesystem::path above = std::filesystem::absolute(folder, error).parent_path();
+  while (above.has_relative_path() && !std::filesystem::exists(above, error)) {
+    above = above.parent_path();
+  }
+  std::string trial = above / ".nidus-XXXXXX";
+  if (!::mkdtemp(trial.data())) return makeFailure(folder, errno);
+  ::rmdir(trial.c_str());
+  return std::nullopt;
 }
 
 Result<FolderLock> FolderLock::take(const std::filesystem::path& folder) {

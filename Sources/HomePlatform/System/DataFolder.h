@@ -15,6 +15,10 @@ inline constexpr const char* kVocabularyFile = "vocabulary.json";
 /// when it is missing. An existing folder is left as it is.
 [[nodiscard]] Status prepareDataFolder(const std::filesystem::path& folder);
 
+/// Why a folder that is missing could not be made; none when it could. Tries it with another one in
+/// the same place, which is gone on return.
+[[nodiscard]] Status tryDataFolder(const std::filesystem::path& folder);
+
 /// Keeps other processes and threads that lock the same folder out until it is destroyed.
 class FolderLock {
  public:

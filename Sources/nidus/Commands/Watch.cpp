@@ -31,18 +31,28 @@ class ChangePrinter {
     if (end_) return;
     if (!homes) {
       end_ = report(homes.failure());
-    } else if (known_) {
+      return;
+    }
+    if (known_) {
       print(*homes);
     } else {
-      reportLine("watching " + extentOf(*homes, options_.filter) + "; stop with Ctrl-C");
+      begin(*homes);
     }
-    if (homes) known_ = *homes;
+    known_ = *homes;
   }
 
   /// How the watch has ended by itself; none while it has not.
   [[nodiscard]] const std::optional<ExitStatus>& end() const { return end_; }
 
  private:
+  void begin(const Homes& homes) {
+    if (const Status failure = checkFilter(homes, options_.filter)) {
+      end_ = report(*failure);
+    } else {
+      reportLine("watching " + extentOf(homes, options_.filter) + "; stop with Ctrl-C");
+    }
+  }
+
   void print(const Homes& homes) {
     const std::time_t now = std::time(nullptr);
     std::string text;
@@ -89,8 +99,9 @@ void declareWatch(CommandSyntax& program, Workspace& workspace) {
   const auto options = std::make_shared<WatchOptions>();
   CommandSyntax& syntax = program.command(
       "watch", "Prints values as they change, until it is interrupted",
-      "Tells what this or any other program changes: values, and accessories that come, go, move\n"
-      "or cannot be reached. Changes that follow each other closely may be told as one. Example:\n"
+      "Tells what this or any other program changes: values, accessories that come, go, move or\n"
+      "cannot be reached, and names. Changes that follow each other closely may be told as one. "
+      "Example:\n"
       "  nidus watch --room Kitchen\n\n"
       "Exit status: 0 interrupted or nobody reads any more, 2 bad input, 4 the platform failed.");
   syntax.option("--home", "NAME", options->filter.home, "Only what is in the home of that name");

@@ -5,14 +5,13 @@
 namespace nidus {
 
 void checkAccessories(const Examination& examination, Findings& findings) {
-  const std::vector<HomeData>& homes = *examination.homes;
-  for (const HomeData& home : homes) {
+  for (const HomeData& home : *examination.homes) {
     for (const AccessoryData& accessory : home.accessories) {
       if (accessory.reachable) continue;
       findings.push_back(
           {Severity::attention, pathOf(home, accessory), "the accessory cannot be reached",
            "see to its power and network, or remove it with nidus home remove accessory " +
-               shellWord(accessory.name.view()) + homeOption(homes, home)});
+               wordsOf(accessory)});
     }
   }
 }

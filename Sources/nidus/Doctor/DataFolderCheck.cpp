@@ -57,11 +57,15 @@ void checkPlace(const Place& place, Findings& findings) {
 }  // namespace
 
 void checkDataFolder(const Examination& examination, Findings& findings) {
+  if (examination.folderFailure) {
+    findings.push_back(findingOf(*examination.folderFailure));
+    return;
+  }
   const std::filesystem::path& folder = examination.folder;
   std::error_code ignored;
-  if (std::filesystem::exists(folder, ignored) && !std::filesystem::is_directory(folder, ignored)) {
-    findings.push_back({Severity::attention, folder.string(), "it is not a folder",
-                        "move the file away, or give another data folder with --data DIR"});
+  if (!std::filesystem::exists(folder, ignored)) {
+    findings.push_back({Severity::note, folder.string(), "there is none yet",
+                        "it is made when it is first needed"});
     return;
   }
   checkPlace({folder, R_OK | W_OK | X_OK, "rwx"}, findings);

@@ -1,7 +1,6 @@
 #include "nidus/Doctor/Doctor.h"
 
 #include <array>
-#include <system_error>
 
 #include "nidus/Doctor/Checks.h"
 
@@ -10,16 +9,12 @@ namespace {
 
 bool always(const Examination& /*examination*/) { return true; }
 
-bool hasFolder(const Examination& examination) {
-  std::error_code ignored;
-  return std::filesystem::exists(examination.folder, ignored);
-}
-
-bool hasDatabase(const Examination& examination) { return examination.hasDatabase; }
+/// All that fails for want of a folder is the folder's matter.
+bool mayHaveFiles(const Examination& examination) { return !examination.folderFailure; }
 
 /// Homes that cannot be read are the database's matter.
 bool mayHaveHomes(const Examination& examination) {
-  return examination.homes || !examination.hasDatabase;
+  return mayHaveFiles(examination) && (examination.homes || !examination.hasDatabase);
 }
 
 bool hasHomes(const Examination& examination) {
@@ -34,11 +29,11 @@ struct Check {
 
 /// In the order in which people read them: what everything rests on comes first.
 constexpr std::array kChecks = {
-    Check{"data folder", hasFolder, checkDataFolder},
-    Check{"database", hasDatabase, checkDatabase},
+    Check{"data folder", always, checkDataFolder},
+    Check{"database", mayHaveFiles, checkDatabase},
     Check{"plug-in", always, checkModule},
-    Check{"vocabulary", always, checkVocabulary},
-    Check{"preferences", always, checkPreferences},
+    Check{"vocabulary", mayHaveFiles, checkVocabulary},
+    Check{"preferences", mayHaveFiles, checkPreferences},
     Check{"homes", mayHaveHomes, checkHomes},
     Check{"names", hasHomes, checkNames},
     Check{"services", hasHomes, checkAddresses},

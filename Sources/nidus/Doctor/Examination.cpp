@@ -1,6 +1,7 @@
 #include "nidus/Doctor/Examination.h"
 
 #include <chrono>
+#include <string>
 #include <system_error>
 #include <utility>
 
@@ -16,6 +17,18 @@ namespace {
 /// How long to wait for a process that is changing the homes: a busy home is no ill one.
 constexpr std::chrono::seconds kPatience{10};
 
+Status failureOf(const std::filesystem::path& folder) {
+  std::error_code error;
+  const auto kind = std::filesystem::status(folder, error).type();
+  if (kind == std::filesystem::file_type::not_found) return tryDataFolder(folder);
+  if (kind == std::filesystem::file_type::directory) return std::nullopt;
+  const std::string reason = kind == std::filesystem::file_type::none
+                                 ? "it cannot be looked at: " + error.message()
+                                 : "it is not a folder";
+  return Failure{Failure::Kind::platform,
+                 folder.string() + ": " + reason + "; give another data folder with --data DIR"};
+}
+
 void readDatabase(Examination& examination) {
   const auto file = examination.folder / kDatabaseFile;
   std::error_code ignored;
@@ -28,9 +41,11 @@ void readDatabase(Examination& examination) {
 
 void readVocabulary(Examination& examination) {
   auto vocabulary = loadVocabulary(examination.folder / kVocabularyFile);
-  if (!vocabulary) examination.vocabularyFailure = vocabulary.failure();
-  examination.metadata = std::make_shared<const MetadataMapper>(vocabulary ? std::move(*vocabulary)
-                                                                           : builtInVocabulary());
+  if (vocabulary) {
+    examination.metadata = std::make_shared<const MetadataMapper>(std::move(*vocabulary));
+  } else {
+    examination.vocabularyFailure = vocabulary.failure();
+  }
 }
 
 void readPreferences(Examination& examination) {
@@ -47,9 +62,12 @@ void readPreferences(Examination& examination) {
 Examination examine(const std::filesystem::path& folder) {
   Examination examination;
   examination.folder = folder;
-  readDatabase(examination);
+  examination.metadata = std::make_shared<const MetadataMapper>(builtInVocabulary());
   const auto module = openOwnModule();
   if (!module) examination.moduleFailure = module.failure();
+  examination.folderFailure = failureOf(folder);
+  if (examination.folderFailure) return examination;
+  readDatabase(examination);
   readVocabulary(examination);
   readPreferences(examination);
   return examination;

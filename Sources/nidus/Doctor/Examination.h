@@ -14,7 +14,9 @@ namespace nidus {
 
 /// All that the doctor's checks look at, read once.
 struct Examination {
-  std::filesystem::path folder;           ///< The data folder, which may be missing.
+  std::filesystem::path folder;  ///< The data folder, which may be missing.
+  /// Why no files can be kept there: then none is looked for, and there is nothing to say of them.
+  Status folderFailure;
   bool hasDatabase = false;               ///< Whether there is a database file.
   std::vector<Failure> databaseFailures;  ///< What is wrong with it.
   /// The homes of the database; none when there is none or it cannot be read.
@@ -27,7 +29,7 @@ struct Examination {
   JsonValue::Object preferences;  ///< Empty when they cannot be read.
 };
 
-/// Reads what there is in a data folder and finds the module. Makes and changes nothing.
+/// Reads what there is in a data folder and finds the module. Leaves all as it was.
 [[nodiscard]] Examination examine(const std::filesystem::path& folder);
 
 }  // namespace nidus

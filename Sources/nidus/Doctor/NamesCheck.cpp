@@ -38,8 +38,7 @@ template <class Object>
 NameSakes<Object> namedOf(const HomeData& home, const std::vector<Object>& objects) {
   NameSakes<Object> all;
   for (const Object& object : objects) {
-    all.push_back(
-        {&object, home.name.str() + " / " + object.name.str(), object.uuid.UUIDString().str()});
+    all.push_back({&object, home.name.str() + " / " + object.name.str(), wordsOf(object)});
   }
   return all;
 }
@@ -75,7 +74,7 @@ std::vector<HomeData>::const_iterator primaryOf(const std::vector<HomeData>& hom
 void checkHomeNames(const std::vector<HomeData>& homes, Findings& findings) {
   NameSakes<HomeData> all;
   for (const HomeData& home : homes) {
-    all.push_back({&home, home.name.str(), home.uuid.UUIDString().str()});
+    all.push_back({&home, home.name.str(), wordsOf(home)});
   }
   const auto primary =
       std::find_if(homes.begin(), homes.end(), [](const HomeData& home) { return home.primary; });
@@ -112,7 +111,7 @@ void checkRoomsNamedLikeHome(const HomeData& home, Findings& findings) {
     if (room == home.rooms.end()) continue;
     findings.push_back({Severity::attention, home.name.str() + " / " + room->name.str(),
                         "the room is named like its home: for orders, what is in it is in no room",
-                        "nidus home rename room " + room->uuid.UUIDString().str() + " NEWNAME"});
+                        "nidus home rename room " + wordsOf(*room) + " NEWNAME"});
     return;
   }
 }

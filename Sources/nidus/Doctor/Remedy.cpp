@@ -32,10 +32,6 @@ std::string shellWord(std::string_view text) {
   return word + '\'';
 }
 
-std::string homeOption(const std::vector<HomeData>& homes, const HomeData& home) {
-  return homes.size() < 2 ? "" : " --home " + shellWord(home.name.view());
-}
-
 Finding findingOf(const Failure& failure) {
   const auto [problem, remedy] = cutLast(failure.message, "; ");
   const auto colon = problem.find(": ");

@@ -15,8 +15,7 @@ bool contains(const ZoneData& zone, const RoomData& room) {
 /// Looks at the zones and rooms of one home.
 class RoomLook {
  public:
-  RoomLook(const HomeData& home, std::string homeOption, Findings& findings)
-      : home_(home), homeOption_(std::move(homeOption)), findings_(findings) {}
+  RoomLook(const HomeData& home, Findings& findings) : home_(home), findings_(findings) {}
 
   void take() {
     for (const ZoneData& zone : home_.zones) {
@@ -31,10 +30,9 @@ class RoomLook {
 
  private:
   void addEmpty(const ZoneData& zone) {
-    const std::string name = shellWord(zone.name.view());
+    const std::string words = wordsOf(zone);
     add(Severity::attention, zone.name, "the zone has no rooms: an order for it finds nothing",
-        "nidus home move room ROOM --to-zone " + name + homeOption_ +
-            ", or nidus home remove zone " + name + homeOption_);
+        "nidus home move room ROOM --to-zone " + words + ", or nidus home remove zone " + words);
   }
 
   /// The zone for which a room counts in orders: the last that contains it. Null for none.
@@ -52,15 +50,14 @@ class RoomLook {
       const ZoneData* counts = contains(zone, room) ? zoneOf(room) : &zone;
       if (counts == &zone) continue;
       lost += (lost.empty() ? "" : ", ") + room.name.str();
-      if (!remedy.empty()) continue;
-      remedy = "take it out of the other with nidus home move room " + shellWord(room.name.view()) +
-               " --from-zone " + shellWord(counts->name.view()) + homeOption_;
+      remedy += (remedy.empty() ? "" : " && ") + ("nidus home move room " + wordsOf(room)) +
+                " --from-zone " + wordsOf(*counts);
     }
     if (lost.empty()) return;
     add(Severity::attention, zone.name,
         "an order for this zone does not reach " + lost +
             ": a room counts for the last of its zones alone",
-        remedy);
+        "take each out of the later zone with " + remedy);
   }
 
   void checkUse(const RoomData& room) {
@@ -69,7 +66,7 @@ class RoomLook {
         [&room](const AccessoryData& accessory) { return accessory.room == room.uuid; });
     if (isUsed) return;
     add(Severity::note, room.name, "no accessory stands in the room",
-        "nidus home move accessory ACCESSORY --to " + shellWord(room.name.view()) + homeOption_);
+        "nidus home move accessory ACCESSORY --to " + wordsOf(room));
   }
 
   void add(Severity severity, const NDString& name, std::string message, std::string remedy) {
@@ -78,15 +75,13 @@ class RoomLook {
   }
 
   const HomeData& home_;
-  const std::string homeOption_;
   Findings& findings_;
 };
 
 }  // namespace
 
 void checkRooms(const Examination& examination, Findings& findings) {
-  const std::vector<HomeData>& homes = *examination.homes;
-  for (const HomeData& home : homes) RoomLook(home, homeOption(homes, home), findings).take();
+  for (const HomeData& home : *examination.homes) RoomLook(home, findings).take();
 }
 
 }  // namespace nidus

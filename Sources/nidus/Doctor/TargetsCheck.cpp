@@ -27,8 +27,7 @@ constexpr Words kSceneWords = {"scene", "it has no actions: to run it does nothi
 /// Looks at the groups and scenes of one home.
 class TargetLook {
  public:
-  TargetLook(const HomeData& home, std::string homeOption, Findings& findings)
-      : home_(home), homeOption_(std::move(homeOption)), findings_(findings) {
+  TargetLook(const HomeData& home, Findings& findings) : home_(home), findings_(findings) {
     for (const AccessoryData& accessory : home.accessories) {
       if (accessory.reachable) reachable_.insert(accessory.uuid);
     }
@@ -36,26 +35,26 @@ class TargetLook {
 
   void take() {
     for (const ServiceGroupData& group : home_.serviceGroups) {
-      check(group.name, group.services, kGroupWords);
+      check(group, group.services, kGroupWords);
     }
     for (const ActionSetData& scene : home_.actionSets) {
-      check(scene.name, scene.actions, kSceneWords);
+      check(scene, scene.actions, kSceneWords);
     }
   }
 
  private:
-  template <class Target>
-  void check(const NDString& name, const std::vector<Target>& targets, const Words& words) {
+  template <class Object, class Target>
+  void check(const Object& object, const std::vector<Target>& targets, const Words& words) {
     if (targets.empty()) {
-      return add(name, words.isEmpty,
-                 std::string(words.fill) + ", or nidus home remove " + words.kind + ' ' +
-                     shellWord(name.view()) + homeOption_);
+      return add(
+          object.name, words.isEmpty,
+          std::string(words.fill) + ", or nidus home remove " + words.kind + ' ' + wordsOf(object));
     }
     const bool isReached = std::any_of(targets.begin(), targets.end(), [this](const auto& target) {
       return reachable_.count(accessoryOf(target)) > 0;
     });
     if (isReached) return;
-    add(name, std::string("no accessory of the ") + words.kind + " can be reached",
+    add(object.name, std::string("no accessory of the ") + words.kind + " can be reached",
         "see to these accessories, which are listed below");
   }
 
@@ -65,7 +64,6 @@ class TargetLook {
   }
 
   const HomeData& home_;
-  const std::string homeOption_;
   Findings& findings_;
   std::unordered_set<NDUUID> reachable_;
 };
@@ -73,8 +71,7 @@ class TargetLook {
 }  // namespace
 
 void checkTargets(const Examination& examination, Findings& findings) {
-  const std::vector<HomeData>& homes = *examination.homes;
-  for (const HomeData& home : homes) TargetLook(home, homeOption(homes, home), findings).take();
+  for (const HomeData& home : *examination.homes) TargetLook(home, findings).take();
 }
 
 }  // namespace nidus

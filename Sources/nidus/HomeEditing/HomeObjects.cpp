@@ -162,11 +162,7 @@ Failure absence(const std::vector<HomeData>& homes, const ObjectWords& words,
     spellings.push_back(nameAt(homes, words.kind, place).str());
     spellings.push_back(spellingAt(homes, words.kind, place));
   }
-  const std::vector<std::string_view> known(spellings.begin(), spellings.end());
-  const std::string_view meant = nearMiss(words.name, known);
-  return badInput("there is no " + wordOf(words.kind) + ' ' + words.name +
-                  (meant.empty() ? "; nidus home show lists what there is"
-                                 : "; did you mean " + std::string(meant) + '?'));
+  return absenceOf(words.kind, words.name, spellings);
 }
 
 Result<ObjectPlace> findAmong(const std::vector<HomeData>& homes,
@@ -247,6 +243,14 @@ std::string identityAt(const std::vector<HomeData>& homes, ObjectKind kind,
 std::string describe(const std::vector<HomeData>& homes, ObjectKind kind,
                      const ObjectPlace& place) {
   return "the " + wordOf(kind) + ' ' + withHome(homes, kind, place);
+}
+
+Failure absenceOf(ObjectKind kind, const std::string& name, const std::vector<std::string>& known) {
+  const std::vector<std::string_view> words(known.begin(), known.end());
+  const std::string_view meant = nearMiss(name, words);
+  return badInput("there is no " + wordOf(kind) + ' ' + name +
+                  (meant.empty() ? "; nidus home show lists what there is"
+                                 : "; did you mean " + std::string(meant) + '?'));
 }
 
 Failure badInput(std::string message) { return {Failure::Kind::badInput, std::move(message)}; }

@@ -66,6 +66,10 @@ struct ObjectPlace {
 [[nodiscard]] std::string describe(const std::vector<HomeData>& homes, ObjectKind kind,
                                    const ObjectPlace& place);
 
+/// The failure that nothing of a kind is named `name`; names a near miss among `known` spellings.
+[[nodiscard]] Failure absenceOf(ObjectKind kind, const std::string& name,
+                                const std::vector<std::string>& known);
+
 /// A failure of that message that is the fault of what was given.
 [[nodiscard]] Failure badInput(std::string message);
 

@@ -27,9 +27,9 @@ std::string universalTime(std::time_t time) {
   return formatted(parts, "%Y-%m-%dT%H:%M:%SZ");
 }
 
-std::string pathOf(const HomeChange& change) {
+std::string pathOf(const ChangePlace& place) {
   std::string path;
-  for (const NDString& part : {change.home, change.room, change.accessory, change.service}) {
+  for (const NDString& part : {place.home, place.room, place.accessory, place.service}) {
     if (part) path += (path.empty() ? "" : " / ") + part.str();
   }
   return path;
@@ -59,8 +59,8 @@ std::string_view wordOf(HomeChange::Kind kind) {
 
 std::string changeText(const HomeChange& change, std::time_t time, const Vocabulary& vocabulary,
                        const TerminalStyle& style) {
-  std::string text =
-      coloured(localTime(time), Colour::faint, style) + "  " + onOneLine(pathOf(change)) + "  ";
+  std::string text = coloured(localTime(time), Colour::faint, style) + "  " +
+                     onOneLine(pathOf(change.place)) + "  ";
   if (change.kind != HomeChange::Kind::changed) return text.append(wordOf(change.kind)) + '\n';
   return text + onOneLine(change.attribute) + "  " +
          onOneLine(valueOf(change.before, change.attribute, vocabulary)) + " -> " +
@@ -71,10 +71,10 @@ std::string changeJson(const HomeChange& change, std::time_t time) {
   NDDictionary line;
   line.set("time", NDDictionaryValue(NDString(universalTime(time))));
   line.set("change", NDDictionaryValue(NDString(wordOf(change.kind))));
-  line.setIfPresent("home", change.home);
-  line.setIfPresent("room", change.room);
-  line.setIfPresent("accessory", change.accessory);
-  line.setIfPresent("service", change.service);
+  line.setIfPresent("home", change.place.home);
+  line.setIfPresent("room", change.place.room);
+  line.setIfPresent("accessory", change.place.accessory);
+  line.setIfPresent("service", change.place.service);
   if (change.kind == HomeChange::Kind::changed) {
     line.set("attribute", NDDictionaryValue(NDString(change.attribute)));
     line.set("before", NDDictionaryValue(change.before));

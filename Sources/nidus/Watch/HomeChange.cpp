@@ -1,5 +1,6 @@
 #include "nidus/Watch/HomeChange.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <set>
 #include <unordered_map>
@@ -40,6 +41,7 @@ NDDictionary dictionaryOf(const NDString& text) {
 bool isSame(const NDValueRef& a, const NDValueRef& b) { return a && b ? a->isEqual(*b) : !a && !b; }
 
 NDUUID keyOf(const HomeData& home) { return home.uuid; }
+NDUUID keyOf(const RoomData& room) { return room.uuid; }
 NDUUID keyOf(const AccessoryData& accessory) { return accessory.uuid; }
 std::int64_t keyOf(const ServiceData& service) { return service.instanceID; }
 std::int64_t keyOf(const CharacteristicData& characteristic) { return characteristic.instanceID; }
@@ -61,6 +63,10 @@ void forEachPair(const std::vector<Object>& before, const std::vector<Object>& a
   }
 }
 
+NDString shownName(const ServiceData& service) {
+  return service.name ? service.name : NDString("(no name)");
+}
+
 /// Compares two states of the homes.
 class Comparison {
  public:
@@ -76,8 +82,10 @@ class Comparison {
  private:
   /// Appends a change of the object that `place_` says.
   HomeChange& add(HomeChange::Kind kind) {
-    HomeChange& change = changes_.emplace_back(place_);
+    HomeChange& change = changes_.emplace_back();
     change.kind = kind;
+    change.place = place_;
+    change.earlier = earlier_;
     return change;
   }
 
@@ -100,17 +108,32 @@ class Comparison {
     return old && now;
   }
 
+  /// Says one part of the place.
+  void enter(NDString ChangePlace::*part, NDString old, NDString now) {
+    earlier_.*part = std::move(old);
+    place_.*part = std::move(now);
+  }
+  void leave(NDString ChangePlace::*part) { enter(part, nullptr, nullptr); }
+
   void compareHomes(const HomeData* old, const HomeData* now) {
-    place_ = HomeChange();
-    place_.home = (now ? now : old)->name;
+    enter(&ChangePlace::home, (old ? old : now)->name, (now ? now : old)->name);
     if (!isThere(old, now)) return;
     compareTexts("name", old->name, now->name);
+    forEachPair(old->rooms, now->rooms, [this](const RoomData* oldOne, const RoomData* nowOne) {
+      compareRooms(oldOne, nowOne);
+      leave(&ChangePlace::room);
+    });
     forEachPair(old->accessories, now->accessories,
                 [&](const AccessoryData* oldOne, const AccessoryData* nowOne) {
                   compareAccessories({*old, oldOne}, {*now, nowOne});
-                  place_.accessory = nullptr;
-                  place_.room = nullptr;
+                  leave(&ChangePlace::accessory);
+                  leave(&ChangePlace::room);
                 });
+  }
+
+  void compareRooms(const RoomData* old, const RoomData* now) {
+    enter(&ChangePlace::room, (old ? old : now)->name, (now ? now : old)->name);
+    if (isThere(old, now)) compareTexts("name", old->name, now->name);
   }
 
   /// An accessory, null where there is none, and its home.
@@ -121,9 +144,10 @@ class Comparison {
   };
 
   void compareAccessories(const PlacedAccessory& old, const PlacedAccessory& now) {
-    const PlacedAccessory& known = now.data ? now : old;
-    place_.room = known.room();
-    place_.accessory = known.data->name;
+    const PlacedAccessory& first = old.data ? old : now;
+    const PlacedAccessory& last = now.data ? now : old;
+    enter(&ChangePlace::room, first.room(), last.room());
+    enter(&ChangePlace::accessory, first.data->name, last.data->name);
     if (!isThere(old.data, now.data)) return;
     compareTexts("name", old.data->name, now.data->name);
     if (old.data->room != now.data->room) compareTexts("room", old.room(), now.room());
@@ -134,13 +158,12 @@ class Comparison {
     forEachPair(old.data->services, now.data->services,
                 [this](const ServiceData* oldOne, const ServiceData* nowOne) {
                   compareServices(oldOne, nowOne);
-                  place_.service = nullptr;
+                  leave(&ChangePlace::service);
                 });
   }
 
   void compareServices(const ServiceData* old, const ServiceData* now) {
-    const NDString& name = (now ? now : old)->name;
-    place_.service = name ? name : NDString("(no name)");
+    enter(&ChangePlace::service, shownName(*(old ? old : now)), shownName(*(now ? now : old)));
     if (!isThere(old, now)) return;
     compareTexts("name", old->name, now->name);
     forEachPair(old->characteristics, now->characteristics,
@@ -170,12 +193,59 @@ class Comparison {
   }
 
   const MetadataMapper& metadata_;
-  HomeChange place_;  ///< Where the comparison is.
+  ChangePlace place_;    ///< Where the comparison is, in the later state.
+  ChangePlace earlier_;  ///< The same in the earlier one.
   std::vector<HomeChange> changes_;
 };
 
 bool fits(const std::string& wanted, const NDString& name) {
   return wanted.empty() || (name && isEqualIgnoringDiacritics(wanted, name.view()));
+}
+
+bool isHomeOf(const WatchFilter& filter, const NDString& home) {
+  return filter.home.empty() || home == std::string_view(filter.home);
+}
+
+bool isIn(const ChangePlace& place, const WatchFilter& filter) {
+  return isHomeOf(filter, place.home) && fits(filter.room, place.room) &&
+         fits(filter.service, place.service);
+}
+
+/// Calls `visit` with each service of the filter and its home.
+template <class Visit>
+void forEachWatched(const std::vector<HomeData>& homes, const WatchFilter& filter,
+                    const Visit& visit) {
+  forEachService(
+      homes, [&](const HomeData& home, const AccessoryData& accessory, const ServiceData& service) {
+        const NDString room = roomNameOf(home, accessory);
+        if (isIn({home.name, room, accessory.name, service.name}, filter)) visit(home, service);
+      });
+}
+
+std::vector<std::string> namesOf(const std::vector<HomeData>& homes) {
+  std::vector<std::string> names;
+  for (const HomeData& home : homes) names.push_back(home.name.str());
+  return names;
+}
+
+std::vector<std::string> roomNamesOf(const std::vector<HomeData>& homes,
+                                     const WatchFilter& filter) {
+  std::vector<std::string> names;
+  for (const HomeData& home : homes) {
+    if (!isHomeOf(filter, home.name)) continue;
+    for (const RoomData& room : home.rooms) names.push_back(room.name.str());
+  }
+  return names;
+}
+
+std::vector<std::string> serviceNamesOf(const std::vector<HomeData>& homes,
+                                        const WatchFilter& filter) {
+  std::vector<std::string> names;
+  forEachWatched(homes, {filter.home, filter.room, ""},
+                 [&names](const HomeData& /*home*/, const ServiceData& service) {
+                   if (service.name) names.push_back(service.name.str());
+                 });
+  return names;
 }
 
 }  // namespace
@@ -187,23 +257,37 @@ std::vector<HomeChange> changesBetween(const std::vector<HomeData>& before,
 }
 
 bool isWatched(const HomeChange& change, const WatchFilter& filter) {
-  return (filter.home.empty() || change.home == std::string_view(filter.home)) &&
-         fits(filter.room, change.room) && fits(filter.service, change.service);
+  return isIn(change.place, filter) || isIn(change.earlier, filter);
+}
+
+Status checkFilter(const std::vector<HomeData>& homes, const WatchFilter& filter) {
+  const auto homeNames = namesOf(homes);
+  const auto isHome = [&filter](const std::string& name) { return isHomeOf(filter, name); };
+  if (!filter.home.empty() && std::none_of(homeNames.begin(), homeNames.end(), isHome)) {
+    return absenceOf(ObjectKind::home, filter.home, homeNames);
+  }
+  const auto isMissing = [](const std::string& wanted, const std::vector<std::string>& names) {
+    return !wanted.empty() &&
+           std::none_of(names.begin(), names.end(),
+                        [&wanted](const std::string& name) { return fits(wanted, name); });
+  };
+  const auto rooms = roomNamesOf(homes, filter);
+  if (isMissing(filter.room, rooms)) return absenceOf(ObjectKind::room, filter.room, rooms);
+  const auto services = serviceNamesOf(homes, filter);
+  if (!isMissing(filter.service, services)) return std::nullopt;
+  return absenceOf(ObjectKind::service, filter.service, services);
 }
 
 std::string extentOf(const std::vector<HomeData>& homes, const WatchFilter& filter) {
+  if (homes.empty()) {
+    return "for the first home, which nidus home add home NAME or nidus home import FILE adds";
+  }
   std::size_t services = 0;
   std::set<NDUUID> homesOfServices;
-  forEachService(
-      homes, [&](const HomeData& home, const AccessoryData& accessory, const ServiceData& service) {
-        HomeChange place;
-        place.home = home.name;
-        place.room = roomNameOf(home, accessory);
-        place.service = service.name;
-        if (!isWatched(place, filter)) return;
-        ++services;
-        homesOfServices.insert(home.uuid);
-      });
+  forEachWatched(homes, filter, [&](const HomeData& home, const ServiceData& /*service*/) {
+    ++services;
+    homesOfServices.insert(home.uuid);
+  });
   return counted(services, ObjectKind::service) + " of " +
          counted(homesOfServices.size(), ObjectKind::home);
 }

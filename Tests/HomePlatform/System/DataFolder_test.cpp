@@ -44,6 +44,22 @@ TEST(DataFolderTest, RefusesWhatIsNoFolder) {
   }
 }
 
+TEST(DataFolderTest, IsTriedWithoutATrace) {
+  const TestFolder folder;
+  EXPECT_FALSE(tryDataFolder(folder.path() / "a" / "b"));
+  EXPECT_TRUE(std::filesystem::is_empty(folder.path()));
+}
+
+TEST(DataFolderTest, IsTriedWhereItCannotBeMade) {
+  const TestFolder folder;
+  const std::string below = folder.write("file", "") + "/below";
+  for (const std::string& path : {below, std::string("/proc/nidus")}) {
+    const Status failure = tryDataFolder(path);
+    ASSERT_TRUE(failure);
+    EXPECT_THAT(failure->message, StartsWith(path + ": the data folder cannot be made: "));
+  }
+}
+
 TEST(FolderLockTest, KeepsOthersOut) {
   const TestFolder folder;
   auto lock = FolderLock::take(folder.path());

@@ -1,4 +1,5 @@
 #include "nidus/Doctor/DoctorTest.h"
+#include "nidus/Doctor/Remedy.h"
 #include "nidus/HomeDataBuilder.h"
 
 namespace nidus {
@@ -242,17 +243,11 @@ TEST_F(RoomsCheckTest, FindsNothingInUsedRooms) {
 
 TEST_F(RoomsCheckTest, FindsZonesWithoutRooms) {
   examination_.homes = {HomeDataBuilder("Cottage").zone("Up There", {}).build()};
+  const std::string zone = wordsOf(examination_.homes->front().zones[0]);
   EXPECT_THAT(findingsOf(checkRooms),
-              ElementsAre(NeedsAttention("Cottage / Up There",
-                                         AllOf(HasSubstr("has no rooms"),
-                                               EndsWith("nidus home remove zone 'Up There'")))));
-}
-
-TEST_F(RoomsCheckTest, NamesTheHomeWhereThereAreSeveral) {
-  examination_.homes = {HomeDataBuilder("Cottage").zone("Up", {}).build(),
-                        HomeDataBuilder("Flat").build()};
-  EXPECT_THAT(findingsOf(checkRooms),
-              ElementsAre(NeedsAttention("Cottage / Up", EndsWith("zone Up --home Cottage"))));
+              ElementsAre(NeedsAttention(
+                  "Cottage / Up There",
+                  AllOf(HasSubstr("has no rooms"), EndsWith("nidus home remove zone " + zone)))));
 }
 
 TEST_F(RoomsCheckTest, FindsZonesThatLoseTheirRooms) {
@@ -265,15 +260,33 @@ TEST_F(RoomsCheckTest, FindsZonesThatLoseTheirRooms) {
                             .zone("Top", {1})
                             .build()};
   EXPECT_THAT(findingsOf(checkRooms),
-              ElementsAre(NeedsAttention("Cottage / All",
-                                         AllOf(HasSubstr("does not reach Attic:"),
-                                               EndsWith("move room Attic --from-zone Top")))));
+              ElementsAre(NeedsAttention("Cottage / All", HasSubstr("does not reach Attic:"))));
+}
+
+TEST_F(RoomsCheckTest, AdvisesOnAllRoomsThatAreLost) {
+  examination_.homes = {HomeDataBuilder("Cottage")
+                            .room("Hall")
+                            .light("A")
+                            .room("Attic")
+                            .light("B")
+                            .zone("All", {0, 1})
+                            .zone("Low", {0})
+                            .zone("Top", {1})
+                            .build()};
+  const HomeData& home = examination_.homes->front();
+  EXPECT_THAT(findingsOf(checkRooms),
+              ElementsAre(NeedsAttention(
+                  "Cottage / All",
+                  EndsWith("nidus home move room " + wordsOf(home.rooms[0]) + " --from-zone " +
+                           wordsOf(home.zones[1]) + " && nidus home move room " +
+                           wordsOf(home.rooms[1]) + " --from-zone " + wordsOf(home.zones[2])))));
 }
 
 TEST_F(RoomsCheckTest, NotesRoomsWithoutAccessories) {
   examination_.homes = {HomeDataBuilder("Cottage").room("Hall").build()};
+  const std::string room = wordsOf(examination_.homes->front().rooms[0]);
   EXPECT_THAT(findingsOf(checkRooms),
-              ElementsAre(IsNote("Cottage / Hall", HasSubstr("--to Hall"))));
+              ElementsAre(IsNote("Cottage / Hall", EndsWith("--to " + room))));
 }
 
 using TargetsCheckTest = DoctorCheckTest;
@@ -291,10 +304,13 @@ TEST_F(TargetsCheckTest, FindsNothingWhereOneCanBeReached) {
 
 TEST_F(TargetsCheckTest, FindsEmptyGroupsAndScenes) {
   examination_.homes = {HomeDataBuilder("Cottage").group("Corner", {}).scene("Night", {}).build()};
+  const HomeData& home = examination_.homes->front();
   EXPECT_THAT(
       findingsOf(checkTargets),
-      ElementsAre(NeedsAttention("Cottage / Corner", EndsWith("nidus home remove group Corner")),
-                  NeedsAttention("Cottage / Night", EndsWith("nidus home remove scene Night"))));
+      ElementsAre(NeedsAttention("Cottage / Corner", EndsWith("nidus home remove group " +
+                                                              wordsOf(home.serviceGroups[0]))),
+                  NeedsAttention("Cottage / Night", EndsWith("nidus home remove scene " +
+                                                             wordsOf(home.actionSets[0])))));
 }
 
 TEST_F(TargetsCheckTest, FindsGroupsAndScenesBeyondReach) {
@@ -318,9 +334,10 @@ TEST_F(AccessoriesCheckTest, FindsThoseBeyondReach) {
                             .light("Far Away")
                             .unreachable()
                             .build()};
+  const std::string away = wordsOf(examination_.homes->front().accessories[1]);
   EXPECT_THAT(findingsOf(checkAccessories),
               ElementsAre(NeedsAttention("Cottage / Hall / Far Away",
-                                         EndsWith("nidus home remove accessory 'Far Away'"))));
+                                         EndsWith("nidus home remove accessory " + away))));
 }
 
 }  // namespace

@@ -40,10 +40,15 @@ TEST_F(DataFolderCheckTest, FindsFilesThatOthersMayChange) {
                           NeedsAttention("vocabulary.json", HasSubstr("chmod go-w"))));
 }
 
-TEST_F(DataFolderCheckTest, FindsAFileInPlaceOfTheFolder) {
-  examination_.folder = folder_.write("data", "");
+TEST_F(DataFolderCheckTest, TellsWhyThereCanBeNone) {
+  examination_.folderFailure = Failure{Failure::Kind::platform, "/data: is no folder; move it"};
   EXPECT_THAT(findingsOf(checkDataFolder),
-              ElementsAre(NeedsAttention("data", HasSubstr("not a folder"))));
+              ElementsAre(NeedsAttention("/data", "is no folder; move it")));
+}
+
+TEST_F(DataFolderCheckTest, NotesThatThereIsNoneYet) {
+  examination_.folder = folder_.path() / "none";
+  EXPECT_THAT(findingsOf(checkDataFolder), ElementsAre(IsNote("/none", HasSubstr("none yet"))));
 }
 
 TEST_F(DataFolderCheckTest, FindsFilesThatLeadInCircles) {
@@ -56,6 +61,12 @@ using DatabaseCheckTest = DoctorCheckTest;
 
 TEST_F(DatabaseCheckTest, FindsNothingInASoundOne) {
   EXPECT_THAT(findingsOf(checkDatabase), IsEmpty());
+}
+
+TEST_F(DatabaseCheckTest, NotesThatThereIsNoneYet) {
+  examination_.hasDatabase = false;
+  EXPECT_THAT(findingsOf(checkDatabase),
+              ElementsAre(IsNote("/data/home.db", HasSubstr("none yet"))));
 }
 
 TEST_F(DatabaseCheckTest, TellsPlaceDamageAndRemedyApart) {

@@ -116,6 +116,29 @@ TEST_F(ChangesBetweenTest, TellsNamesRoomsAndReachability) {
                           "Villa / Café / Spot  reachable  yes -> no"));
 }
 
+TEST_F(ChangesBetweenTest, TellsRoomsThatComeGoAndAreRenamed) {
+  after_[0].rooms[0].name = "Bistro";
+  after_[0].rooms.pop_back();
+  accessory(1).room.reset();
+  EXPECT_THAT(lines(),
+              ElementsAre("Cottage / Bistro  name  Café -> Bistro", "Cottage / Attic  removed",
+                          "Cottage / Spot  room  Attic -> no room"));
+  std::swap(before_, after_);
+  EXPECT_THAT(
+      lines({"", "Attic", ""}),
+      ElementsAre("Cottage / Attic  added", "Cottage / Attic / Spot  room  no room -> Attic"));
+}
+
+TEST_F(ChangesBetweenTest, IsWatchedWhereItWasAndWhereItIs) {
+  accessory(1).room = after_[0].rooms[0].uuid;
+  for (const char* room : {"Attic", "Café"}) {
+    EXPECT_THAT(lines({"", room, ""}), ElementsAre("Cottage / Café / Spot  room  Attic -> Café"));
+  }
+  after_[0].name = "Villa";
+  EXPECT_THAT(lines({"Cottage", "", ""}), ElementsAre("Villa  name  Cottage -> Villa",
+                                                      "Villa / Café / Spot  room  Attic -> Café"));
+}
+
 TEST_F(ChangesBetweenTest, IsFilteredAsOrdersAre) {
   characteristic().value = NDValue::boolean(true);
   EXPECT_EQ(lines({"Cottage", "Cafe", "Lamp"}).size(), 1U);
@@ -140,7 +163,26 @@ TEST_F(ChangesBetweenTest, IsToldToProgramsAsJson) {
 TEST_F(ChangesBetweenTest, CountsWhatIsWatched) {
   EXPECT_EQ(extentOf(before_, {}), "2 services of 1 home");
   EXPECT_EQ(extentOf(before_, {"", "Attic", ""}), "1 service of 1 home");
-  EXPECT_EQ(extentOf(before_, {"Flat", "", ""}), "0 services of 0 homes");
+  before_[0].accessories.clear();
+  EXPECT_EQ(extentOf(before_, {"Cottage", "", ""}), "0 services of 0 homes");
+}
+
+TEST_F(ChangesBetweenTest, RefusesFiltersThatFitNothing) {
+  EXPECT_FALSE(checkFilter(before_, {"Cottage", "Cafe", "Lamp"}));
+  EXPECT_FALSE(checkFilter({}, {}));
+  before_.push_back(HomeDataBuilder("Flat").room("Hall").build());
+  EXPECT_FALSE(checkFilter(before_, {"Flat", "Hall", ""}));
+  const std::vector<std::pair<WatchFilter, std::string>> table = {
+      {{"cottage", "", ""}, "there is no home cottage; did you mean Cottage?"},
+      {{"Flat", "Café", ""}, "there is no room Café; nidus home show lists what there is"},
+      {{"", "Attic", "Lamp"}, "there is no service Lamp; nidus home show lists what there is"},
+      {{"", "", "Lampp"}, "there is no service Lampp; did you mean Lamp?"},
+  };
+  for (const auto& [filter, message] : table) {
+    const Status failure = checkFilter(before_, filter);
+    ASSERT_TRUE(failure) << message;
+    EXPECT_EQ(failure->message, message);
+  }
 }
 
 }  // namespace
