@@ -8,6 +8,7 @@
 #include "nidus/StandardStreams.h"
 #include "nidus/Watch/ChangeText.h"
 #include "nidus/Watch/HomeChange.h"
+#include "nidus/Watch/WatchFilter.h"
 #include "nidus/Watch/WorkLoop.h"
 #include "nidus/Workspace.h"
 

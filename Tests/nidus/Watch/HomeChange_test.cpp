@@ -7,6 +7,7 @@
 #include "HomePlatform/Metadata/VocabularyReader.h"
 #include "nidus/HomeDataBuilder.h"
 #include "nidus/Watch/ChangeText.h"
+#include "nidus/Watch/WatchFilter.h"
 
 namespace nidus {
 namespace {
