@@ -49,7 +49,7 @@ TEST_F(HomeChangeTest, RefusesToRename) {
   expectRefusal({"home", "rename", "room", "Attic", "Galley"}, "no room Attic");
   expectRefusal({"home", "rename", "room", "Study", ""}, "empty");
   expectRefusal({"home", "rename", "room", "Study"}, "--help");
-  expectRefusal({"home", "rename", "house", "Study", "Den"}, "--help");
+  expectRefusal({"home", "rename", "house", "Study", "Den"}, "did you mean home?");
   expectRefusal({"home", "rename", "home", "Cottage", "Hut", "--home", "Cottage"}, "--help");
 }
 
@@ -130,8 +130,17 @@ TEST_F(HomeChangeTest, KeepsWhenInterrupted) {
   TerminalProcess terminal(start({"home", "remove", "home", "Cottage"}));
   ASSERT_TRUE(terminal.waitFor("[y/N] "));
   terminal.interrupt();
-  EXPECT_EQ(terminal.finish().signal, SIGINT);
+  const ProgramEnd end = terminal.finish();
+  EXPECT_EQ(end.signal, SIGINT);
+  EXPECT_THAT(end.output, ::testing::EndsWith("[y/N] ^C\n"));
   EXPECT_EQ(exported(), before_);
+}
+
+TEST_F(HomeChangeTest, AnswersTheEndOfInputOnALineOfItsOwn) {
+  TerminalProcess terminal(start({"home", "remove", "home", "Cottage"}));
+  ASSERT_TRUE(terminal.waitFor("[y/N] "));
+  terminal.write("\x04");
+  EXPECT_THAT(terminal.finish().output, HasSubstr("\nnothing was removed\n"));
 }
 
 TEST_F(HomeChangeTest, AsksNothingWithYesOnATerminal) {

@@ -223,6 +223,34 @@ TEST_F(HomeEditTest, KeepsABadDocumentThatIsGivenUp) {
   EXPECT_EQ(exported(), before_);
 }
 
+TEST_F(HomeEditTest, SaysWhenNothingIsLeftToKeep) {
+  TerminalProcess terminal(editing("truncate -s0 \"$1\"", false));
+  ASSERT_TRUE(terminal.waitFor("Edit it again? [Y/n] "));
+  terminal.write("n\n");
+  const ProgramEnd end = terminal.finish();
+  EXPECT_EQ(end.exitStatus, 2);
+  EXPECT_THAT(end.output, ::testing::EndsWith("nidus: nothing was changed\n"));
+  EXPECT_TRUE(isNothingLeft());
+}
+
+TEST_F(HomeEditTest, TellsOfAMissingEditorOnOneLine) {
+  for (const char* editor : {"nosucheditor -w", "vi 'unclosed", "/no/such/vi"}) {
+    ProgramStart edit = editing("", true);
+    edit.environment["EDITOR"] = editor;
+    const ProgramEnd end = runProgram(edit);
+    EXPECT_EQ(end.exitStatus, 2);
+    EXPECT_THAT(end.errors, AllOf(IsOneFailure("the editor " + std::string(editor) + " cannot be"),
+                                  HasSubstr("set EDITOR")));
+  }
+}
+
+TEST_F(HomeEditTest, TakesAnEditorWithAVariable) {
+  ProgramStart edit = editing(kRename, true);
+  edit.environment["EDITOR"] = "LANG=C " + *edit.environment["EDITOR"];
+  EXPECT_EQ(runProgram(edit).exitStatus, 0);
+  EXPECT_THAT(exported(), HasSubstr("\"Den\""));
+}
+
 TEST_F(HomeEditTest, LeavesInterruptsToTheEditor) {
   const std::string script = "trap 'exit 0' INT\necho ready\nread -r line || true\n";
   TerminalProcess terminal(editing(script, false));

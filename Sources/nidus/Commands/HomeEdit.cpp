@@ -1,5 +1,4 @@
 #include <algorithm>
-#include <cstdlib>
 #include <fstream>
 #include <memory>
 #include <optional>
@@ -15,24 +14,13 @@
 #include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/TemporaryFolder.h"
+#include "nidus/Terminal/Editor.h"
 #include "nidus/Terminal/ForegroundProgram.h"
 #include "nidus/Terminal/Question.h"
 #include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
-
-std::string editorCommand() {
-  for (const char* variable : {"VISUAL", "EDITOR"}) {
-    const char* const editor = std::getenv(variable);
-    if (editor && *editor != '\0') return std::string(editor) + " \"$1\"";
-  }
-  return "if command -v editor >/dev/null; then editor \"$1\"; else vi \"$1\"; fi";
-}
-
-/// What the shell runs to edit the file "$1". The shell outlives an interrupt that the editor
-/// takes.
-std::string editorScript() { return "trap : INT QUIT; " + editorCommand(); }
 
 std::string documentOf(const std::vector<HomeData>& homes) {
   std::ostringstream out;
@@ -61,14 +49,16 @@ class HomeEditor {
   ExitStatus run() {
     if (auto failure = writeDocument()) return report(*failure);
     for (;;) {
-      if (auto failure = openEditor()) return giveUp(*failure);
+      if (auto failure = editInForeground(file_)) return giveUp(*failure);
       const std::string text = contentOf(file_);
       if (text == before_) return sayUnchanged();
       auto edited = read(text, file_.string());
       if (edited) return finish(std::move(*edited));
       if (!canAsk()) return giveUp(edited.failure());
       reportLine(edited.failure().message);
-      if (!ask("Edit it again?", EmptyAnswer::yes)) return giveUp({Failure::Kind::badInput, ""});
+      if (!ask("Edit it again?", EmptyAnswer::yes)) {
+        return giveUp({Failure::Kind::badInput, "nothing was changed"});
+      }
     }
   }
 
@@ -85,15 +75,6 @@ class HomeEditor {
     std::error_code error;
     std::filesystem::permissions(file_, std::filesystem::perms(0600), error);
     return std::nullopt;
-  }
-
-  [[nodiscard]] Status openEditor() const {
-    const auto ended = runInForeground({"/bin/sh", "-c", editorScript(), "nidus", file_.string()});
-    if (!ended) return ended.failure();
-    if (*ended == 0) return std::nullopt;
-    return Failure{Failure::Kind::badInput, "the editor ended with status " +
-                                                std::to_string(*ended) +
-                                                "; set EDITOR to one that works here"};
   }
 
   static ExitStatus sayUnchanged() { return printText("nothing was changed\n"); }
@@ -144,9 +125,8 @@ class HomeEditor {
     const std::string text = contentOf(file_);
     if (text.empty() || text == before_) return report(failure);
     folder_.keep();
-    const std::string separator = failure.message.empty() ? "" : "; ";
-    return report({failure.kind,
-                   failure.message + separator + "what you edited is kept as " + file_.string()});
+    return report(
+        {failure.kind, failure.message + "; what you edited is kept as " + file_.string()});
   }
 
   ExitStatus sayKept(const std::string& outcome) {

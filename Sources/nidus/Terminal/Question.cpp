@@ -4,12 +4,35 @@
 
 #include <cctype>
 #include <cerrno>
+#include <csignal>
 #include <optional>
 
 #include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {
+
+struct sigaction interruptBefore = {};  // for a handler, which sees nothing else
+
+void endLineAndInterrupt(int signal) {
+  static_cast<void>(writeWhole(STDERR_FILENO, "\n"));
+  sigaction(signal, &interruptBefore, nullptr);
+  raise(signal);
+}
+
+/// While it lives, an interrupt ends the line of the question before it does what it did before.
+class LineEndOnInterrupt {
+ public:
+  LineEndOnInterrupt() {
+    struct sigaction ending = {};
+    ending.sa_handler = endLineAndInterrupt;
+    sigaction(SIGINT, nullptr, &interruptBefore);
+    if (interruptBefore.sa_handler != SIG_IGN) sigaction(SIGINT, &ending, nullptr);
+  }
+  LineEndOnInterrupt(const LineEndOnInterrupt&) = delete;
+  LineEndOnInterrupt& operator=(const LineEndOnInterrupt&) = delete;
+  ~LineEndOnInterrupt() { sigaction(SIGINT, &interruptBefore, nullptr); }
+};
 
 /// The letters of the next line of standard input, in lower case; none at its end. Reads no further
 /// than the line, as an editor or a second question may come after it.
@@ -32,8 +55,12 @@ bool canAsk() { return isatty(STDIN_FILENO) == 1 && isatty(STDERR_FILENO) == 1; 
 bool ask(const std::string& question, EmptyAnswer empty) {
   const std::string choice = empty == EmptyAnswer::yes ? " [Y/n] " : " [y/N] ";
   if (!writeWhole(STDERR_FILENO, onOneLine(question) + choice)) return false;
+  const LineEndOnInterrupt lineEnd;
   const auto answer = readAnswer();
-  if (!answer) return false;
+  if (!answer) {
+    static_cast<void>(writeWhole(STDERR_FILENO, "\n"));
+    return false;
+  }
   return answer->empty() ? empty == EmptyAnswer::yes : *answer == "y" || *answer == "yes";
 }
 
