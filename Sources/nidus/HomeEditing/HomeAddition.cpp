@@ -134,7 +134,7 @@ Result<std::string> addScene(std::vector<HomeData>& homes, const NewObject& scen
   std::vector<SettingWords> words;
   std::vector<std::string> services;
   for (const std::string& setting : settings) {
-    auto read = readSetting(setting);
+    auto read = readSetting(setting, vocabulary);
     if (!read) return read.failure();
     services.push_back(read->service);
     words.push_back(std::move(*read));

@@ -255,14 +255,29 @@ Failure absenceOf(ObjectKind kind, const std::string& name, const std::vector<st
 
 Failure badInput(std::string message) { return {Failure::Kind::badInput, std::move(message)}; }
 
+namespace {
+
+bool isControl(char32_t c) {
+  constexpr char32_t kFirstPrintable = 0x20;
+  constexpr char32_t kDelete = 0x7f;
+  constexpr char32_t kLastControl = 0x9f;
+  return c < kFirstPrintable || (c >= kDelete && c <= kLastControl);
+}
+
+}  // namespace
+
 Status checkName(const std::string& name) {
-  if (name.empty()) return badInput("a name must not be empty; give one");
+  if (name.find_first_not_of(' ') == std::string::npos)
+    return badInput("a name must not be empty or blank; give one");
   // What is no UTF-8 stands in the decomposition beyond the last code point.
   constexpr char32_t kBeyondUnicode = 0x110000;
   const std::u32string codePoints = withoutDiacritics(name);
   const bool isText = std::all_of(codePoints.begin(), codePoints.end(),
                                   [](char32_t c) { return c < kBeyondUnicode; });
   if (!isText) return badInput("the name " + name + " is not UTF-8; give it in UTF-8");
+  if (std::any_of(codePoints.begin(), codePoints.end(), isControl)) {
+    return badInput("the name " + name + " has control characters; leave them out");
+  }
   return std::nullopt;
 }
 

@@ -73,7 +73,8 @@ struct ObjectPlace {
 /// A failure of that message that is the fault of what was given.
 [[nodiscard]] Failure badInput(std::string message);
 
-/// Refuses what can be no name: an empty text, and one that is not UTF-8.
+/// Refuses what can be no name that a person sees: a blank text, one that is not UTF-8, and one
+/// with control characters.
 [[nodiscard]] Status checkName(const std::string& name);
 
 }  // namespace nidus

@@ -85,13 +85,15 @@ Result<NDValueRef> valueOf(const std::string& text, CharacteristicEntry entry,
 
 }  // namespace
 
-Result<SettingWords> readSetting(const std::string& text) {
+Result<SettingWords> readSetting(const std::string& text, const Vocabulary& vocabulary) {
   std::string rest = text;
   SettingWords words;
   words.value = takeLastWord(rest);
   words.attribute = takeLastWord(rest);
   const std::size_t start = rest.find_first_not_of(kSpace);
-  if (start != std::string::npos) {
+  const bool isValueForgotten =
+      !attributeNamed(words.attribute, vocabulary) && attributeNamed(words.value, vocabulary);
+  if (start != std::string::npos && !isValueForgotten) {
     words.service = rest.substr(start, rest.find_last_not_of(kSpace) + 1 - start);
     return words;
   }

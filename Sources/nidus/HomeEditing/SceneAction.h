@@ -19,8 +19,10 @@ struct SettingWords {
 };
 
 /// Takes "Floor lamp/Lamp brightness 40%" apart: the last word is the value, the one before it the
-/// attribute, and all before that the service. A failure is bad input.
-[[nodiscard]] Result<SettingWords> readSetting(const std::string& text);
+/// attribute, and all before that the service. A failure is bad input: one of the three is missing;
+/// the vocabulary tells a value that was forgotten.
+[[nodiscard]] Result<SettingWords> readSetting(const std::string& text,
+                                               const Vocabulary& vocabulary);
 
 /// Makes the action of a scene that sets an attribute of the service at `place`. The value is that
 /// of the characteristic, in its own unit and within its limits; a temperature without a unit is in

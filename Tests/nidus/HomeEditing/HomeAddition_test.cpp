@@ -113,6 +113,7 @@ TEST_F(HomeAdditionTest, AddsScenesOfSettings) {
 TEST_F(HomeAdditionTest, RefusesWithoutAChange) {
   const ObjectWords lamp{ObjectKind::accessory, "Floor lamp", ""};
   EXPECT_THAT(addHome(homes_, "", false), IsBadInput("empty"));
+  EXPECT_THAT(addHome(homes_, "  ", false), IsBadInput("blank"));
   EXPECT_THAT(addRoom(homes_, {"\xff", "Cottage"}), IsBadInput("UTF-8"));
   EXPECT_THAT(addAccessory(homes_, {"Box", ""}, {"Attic", false}), IsBadInput("no room Attic"));
   EXPECT_THAT(addAccessory(homes_, {"Box", "Cottage"}, {"Study", false}), IsBadInput("no room"));

@@ -115,6 +115,16 @@ TEST(CheckNameTest, RefusesEmptyAndBrokenNames) {
   EXPECT_THAT(broken->message, ::testing::HasSubstr("UTF-8"));
 }
 
+TEST(CheckNameTest, RefusesWhatNobodyCouldRead) {
+  EXPECT_THAT(checkName("  ").value().message, ::testing::HasSubstr("blank"));
+  for (const char* name : {"a\nb", "\x1b[31mred", "a\tb", "a\x7f", "a\xc2\x85"}) {
+    const Status refused = checkName(name);
+    ASSERT_TRUE(refused) << name;
+    EXPECT_THAT(refused->message, ::testing::HasSubstr("control characters"));
+  }
+  EXPECT_FALSE(checkName("Café Corner 2"));
+}
+
 TEST(CountedTest, KnowsOneAndMany) {
   EXPECT_EQ(counted(1, ObjectKind::accessory), "1 accessory");
   EXPECT_EQ(counted(0, ObjectKind::accessory), "0 accessories");

@@ -83,7 +83,7 @@ TEST_F(SceneActionTest, RefusesValuesThatDoNotFit) {
 }
 
 TEST(ReadSettingTest, SplitsFromTheEnd) {
-  const auto words = readSetting(" Floor lamp/Lamp  brightness 40% ");
+  const auto words = readSetting(" Floor lamp/Lamp  brightness 40% ", builtInVocabulary());
   ASSERT_TRUE(words);
   EXPECT_EQ(words->service, "Floor lamp/Lamp");
   EXPECT_EQ(words->attribute, "brightness");
@@ -91,8 +91,10 @@ TEST(ReadSettingTest, SplitsFromTheEnd) {
 }
 
 TEST(ReadSettingTest, RefusesTooFewWords) {
-  for (const char* text : {"", "  ", "40%", "brightness 40%"}) {
-    EXPECT_THAT(readSetting(text), IsBadInput("a service, an attribute and a value")) << text;
+  for (const char* text : {"", "  ", "40%", "brightness 40%", "Floor lamp/Lamp2 brightness"}) {
+    EXPECT_THAT(readSetting(text, builtInVocabulary()),
+                IsBadInput("a service, an attribute and a value"))
+        << text;
   }
 }
 
