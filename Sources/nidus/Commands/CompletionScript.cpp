@@ -31,10 +31,10 @@ void declareCompletion(CommandSyntax& program) {
   const auto shell = std::make_shared<std::string>();
   CommandSyntax& syntax = program.command(
       "completion", "Prints the script by which a shell completes commands of nidus",
-      "It completes commands, options, attributes, and the names of your own home. "
-      "Its first\nlines say where it goes. To try it in this session of bash:\n"
+      "It completes commands, options, attributes, and the names of your own home. Its first\n"
+      "lines say where it goes.\n\nExample: to try it in this session of bash\n"
       "  source <(nidus completion bash)\n\n"
-      "Exit status: 0 success, 2 for another shell.");
+      "Exit status: 0 success, 2 bad input, such as another shell, 4 the platform failed.");
   syntax.requiredArgument("SHELL", *shell, "bash, zsh or fish");
   syntax.candidates("SHELL", {Candidates(std::vector<std::string>{"bash", "zsh", "fish"})});
   syntax.run([shell] { return printScript(*shell); });

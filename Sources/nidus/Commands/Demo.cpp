@@ -132,10 +132,12 @@ ExitStatus lead() {
 
 void declareDemo(CommandSyntax& program) {
   const auto printsHome = std::make_shared<bool>(false);
-  CommandSyntax& syntax =
-      program.command("demo", "Shows what the plug-in can do, on a home of its own",
-                      "Works in a temporary folder; your own homes are neither read nor changed.\n"
-                      "Exit status: 0, or 1 when an answer is not the expected one.");
+  CommandSyntax& syntax = program.command(
+      "demo", "Shows what the plug-in can do, on a home of its own",
+      "Works in a temporary folder; your own homes are neither read nor changed.\n\n"
+      "Example:\n  nidus demo\n\n"
+      "Exit status: 0 success, 1 an answer is not the expected one, 2 bad input, 4 the platform\n"
+      "failed.");
   syntax.flag("--home", *printsHome, "Print the document of the demonstration home instead");
   syntax.run([printsHome] { return *printsHome ? printText(kDemonstrationHome) : lead(); });
 }

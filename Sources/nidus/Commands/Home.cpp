@@ -1,10 +1,15 @@
+#include <string>
+
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 
 namespace nidus {
 
 void declareHome(CommandSyntax& program, Workspace& workspace) {
-  CommandSyntax& home = program.command("home", "Shows, changes, reads and replaces the homes", "");
+  CommandSyntax& home =
+      program.command("home", "Shows, changes, reads and replaces the homes",
+                      std::string("Example:\n  nidus home show") + kQuestionExitStatuses);
   declareHomeImport(home, workspace);
   declareHomeExport(home, workspace);
   declareHomeShow(home, workspace);

@@ -2,6 +2,7 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Commands/HomeChange.h"
 #include "nidus/Commands/ObjectArguments.h"
 #include "nidus/HomeEditing/HomeAddition.h"
@@ -31,10 +32,8 @@ class AdditionSyntax {
   /// Declares the command; the options of the kind are declared on what it gives.
   CommandSyntax& declare(ObjectKind kind, const std::string& example, Addition addition) {
     words_ = std::make_shared<AdditionWords>();
-    CommandSyntax& syntax =
-        add_.command(wordOf(kind), "Adds " + withArticle(kind),
-                     "Example:\n  nidus home add " + example +
-                         "\n\nExit status: 0 added, 2 bad input, 4 the platform failed.");
+    CommandSyntax& syntax = add_.command(wordOf(kind), "Adds " + withArticle(kind),
+                                         "Example:\n  nidus home add " + example + kExitStatuses);
     syntax.requiredArgument("NAME", words_->object.name, "The name that it gets");
     if (kind != ObjectKind::home) {
       syntax.option("--home", "HOME", words_->object.home,
@@ -146,12 +145,14 @@ void declareScene(AdditionSyntax& add) {
 }  // namespace
 
 void declareHomeAdd(CommandSyntax& home, Workspace& workspace) {
-  CommandSyntax& syntax = home.command("add", "Adds a home, a room or any other object",
-                                       "Each kind has a help of its own.\n\n"
-                                       "Examples:\n"
-                                       "  nidus home add home \"Beach House\"\n"
-                                       "  nidus home add room Study\n"
-                                       "  nidus home add accessory \"Floor lamp\" --room Study");
+  CommandSyntax& syntax =
+      home.command("add", "Adds a home, a room or any other object",
+                   std::string("Each kind has a help of its own.\n\n"
+                               "Examples:\n"
+                               "  nidus home add home \"Beach House\"\n"
+                               "  nidus home add room Study\n"
+                               "  nidus home add accessory \"Floor lamp\" --room Study") +
+                       kExitStatuses);
   AdditionSyntax add(syntax, workspace);
   declareSimpleKinds(add);
   declareZone(add);

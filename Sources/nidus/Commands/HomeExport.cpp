@@ -4,6 +4,7 @@
 #include "HomePlatform/Store/HomeDocument.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/FileReplacement.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Workspace.h"
@@ -33,9 +34,11 @@ ExitStatus exportHomes(const std::string& file, Workspace& workspace) {
 
 void declareHomeExport(CommandSyntax& home, Workspace& workspace) {
   const auto file = std::make_shared<std::string>("-");
-  CommandSyntax& syntax =
-      home.command("export", "Writes all homes as a document",
-                   "A file is replaced whole or not at all. The document can be imported again.");
+  CommandSyntax& syntax = home.command(
+      "export", "Writes all homes as a document",
+      std::string("A file is replaced whole or not at all. The document can be imported again.\n\n"
+                  "Example:\n  nidus home export home.json") +
+          kExitStatuses);
   syntax.argument("FILE", *file, "Where to write; standard output when it is left out or -");
   syntax.candidates("FILE", {{CandidateKind::files}});
   syntax.run([file, &workspace] { return exportHomes(*file, workspace); });

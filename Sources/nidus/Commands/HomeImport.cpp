@@ -4,6 +4,7 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Commands/HomeInput.h"
 #include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
@@ -47,10 +48,11 @@ ExitStatus importHomes(const ImportOptions& options, Workspace& workspace) {
 
 void declareHomeImport(CommandSyntax& home, Workspace& workspace) {
   const auto options = std::make_shared<ImportOptions>();
-  CommandSyntax& syntax =
-      home.command("import", "Puts the homes of a document in place of all homes",
-                   "The document is checked whole before anything is changed. Try it first with "
-                   "nidus home check FILE.");
+  CommandSyntax& syntax = home.command(
+      "import", "Puts the homes of a document in place of all homes",
+      std::string("The document is checked whole before anything is changed. Try it first with "
+                  "nidus home check FILE.\n\nExample:\n  nidus home import home.json --merge") +
+          kExitStatuses);
   syntax.requiredArgument("FILE", options->file, "A home document; - reads standard input");
   syntax.candidates("FILE", {{CandidateKind::files}});
   syntax.flag("--merge", options->merges,

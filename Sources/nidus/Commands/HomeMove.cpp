@@ -3,14 +3,13 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Commands/HomeChange.h"
 #include "nidus/Commands/ObjectArguments.h"
 #include "nidus/HomeEditing/HomeMoving.h"
 
 namespace nidus {
 namespace {
-
-constexpr const char kStatuses[] = "\n\nExit status: 0 moved, 2 bad input, 4 the platform failed.";
 
 struct AccessoryMove {
   ObjectWords accessory{ObjectKind::accessory, "", ""};
@@ -32,7 +31,7 @@ void declareAccessoryMove(CommandSyntax& move, Workspace& workspace) {
                    std::string("Examples:\n"
                                "  nidus home move accessory \"Floor lamp\" --to Study\n"
                                "  nidus home move accessory \"Floor lamp\" --to-no-room") +
-                       kStatuses);
+                       kExitStatuses);
   declareObjectArguments(syntax, words->accessory);
   syntax.option("--to", "ROOM", words->room, "The name or UUID of the room");
   syntax.candidates("--to", {candidatesOf(ObjectKind::room)});
@@ -71,7 +70,7 @@ void declareMoveBetweenLists(const MoveBetweenLists& kind, CommandSyntax& move,
   const auto words = std::make_shared<Words>();
   words->member.kind = kind.member;
   CommandSyntax& syntax = move.command(wordOf(kind.member), kind.help,
-                                       std::string("Example:\n  ") + kind.example + kStatuses);
+                                       std::string("Example:\n  ") + kind.example + kExitStatuses);
   declareObjectArguments(syntax, words->member);
   const std::string list = wordOf(kind.list);
   syntax.option("--to-" + list, "NAME", words->lists.to, "The name or UUID of the " + list);
@@ -88,9 +87,10 @@ void declareMoveBetweenLists(const MoveBetweenLists& kind, CommandSyntax& move,
 }  // namespace
 
 void declareHomeMove(CommandSyntax& home, Workspace& workspace) {
-  CommandSyntax& move = home.command(
-      "move", "Moves an accessory to a room, a room to a zone, a service to a group",
-      std::string("Example:\n  nidus home move accessory \"Floor lamp\" --to Study") + kStatuses);
+  CommandSyntax& move =
+      home.command("move", "Moves an accessory to a room, a room to a zone, a service to a group",
+                   std::string("Example:\n  nidus home move accessory \"Floor lamp\" --to Study") +
+                       kExitStatuses);
   declareAccessoryMove(move, workspace);
   declareMoveBetweenLists(kRooms, move, workspace);
   declareMoveBetweenLists(kServices, move, workspace);

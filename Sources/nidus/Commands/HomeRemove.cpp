@@ -3,6 +3,7 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Commands/HomeChange.h"
 #include "nidus/Commands/ObjectArguments.h"
 #include "nidus/HomeEditing/HomeRemoval.h"
@@ -61,9 +62,9 @@ ExitStatus remove(const RemovalWords& words, Workspace& workspace) {
 void declareRemovalOf(ObjectKind kind, CommandSyntax& parent, Workspace& workspace) {
   const auto words = std::make_shared<RemovalWords>();
   words->object.kind = kind;
-  CommandSyntax& syntax = parent.command(
-      wordOf(kind), "Removes " + withArticle(kind),
-      "Exit status: 0 removed, 1 the answer was no, 2 bad input, 4 the platform failed.");
+  CommandSyntax& syntax = parent.command(wordOf(kind), "Removes " + withArticle(kind),
+                                         "Example:\n  nidus home remove " + wordOf(kind) + ' ' +
+                                             exampleName(kind) + kQuestionExitStatuses);
   declareObjectArguments(syntax, words->object);
   syntax.flag("--yes", words->isConfirmed, "Remove without a question");
   syntax.run([words, &workspace] { return remove(*words, workspace); });
@@ -74,12 +75,15 @@ void declareRemovalOf(ObjectKind kind, CommandSyntax& parent, Workspace& workspa
 void declareHomeRemove(CommandSyntax& home, Workspace& workspace) {
   CommandSyntax& syntax = home.command(
       "remove", "Removes a home, a room or any other object",
-      "Says first what else it touches and asks, or, without a terminal, wants --yes: accessories\n"
-      "of a room that is removed stand in no room, services that are removed leave their groups\n"
-      "and scenes, a home goes with all that is in it.\n\n"
-      "Examples:\n"
-      "  nidus home remove room Attic\n"
-      "  nidus home remove accessory \"Floor lamp\" --home \"Beach House\" --yes");
+      std::string("Says first what else it touches and asks, or, without a terminal, wants --yes: "
+                  "accessories\n"
+                  "of a room that is removed stand in no room, services that are removed leave "
+                  "their groups\n"
+                  "and scenes, a home goes with all that is in it.\n\n"
+                  "Examples:\n"
+                  "  nidus home remove room Attic\n"
+                  "  nidus home remove accessory \"Floor lamp\" --home \"Beach House\" --yes") +
+          kQuestionExitStatuses);
   for (const ObjectKind kind : kObjectKinds) declareRemovalOf(kind, syntax, workspace);
 }
 

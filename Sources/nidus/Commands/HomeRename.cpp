@@ -2,14 +2,13 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Commands/HomeChange.h"
 #include "nidus/Commands/ObjectArguments.h"
 #include "nidus/HomeEditing/HomeRenaming.h"
 
 namespace nidus {
 namespace {
-
-constexpr const char kStatuses[] = "Exit status: 0 renamed, 2 bad input, 4 the platform failed.";
 
 struct Renaming {
   ObjectWords object;
@@ -19,7 +18,9 @@ struct Renaming {
 void declareRenamingOf(ObjectKind kind, CommandSyntax& rename, Workspace& workspace) {
   const auto words = std::make_shared<Renaming>();
   words->object.kind = kind;
-  CommandSyntax& syntax = rename.command(wordOf(kind), "Renames " + withArticle(kind), kStatuses);
+  CommandSyntax& syntax = rename.command(wordOf(kind), "Renames " + withArticle(kind),
+                                         "Example:\n  nidus home rename " + wordOf(kind) + ' ' +
+                                             exampleName(kind) + " \"New name\"" + kExitStatuses);
   declareObjectArguments(syntax, words->object);
   syntax.requiredArgument("NEWNAME", words->newName, "The name that it gets");
   syntax.run([words, &workspace] {
@@ -32,10 +33,12 @@ void declareRenamingOf(ObjectKind kind, CommandSyntax& rename, Workspace& worksp
 }  // namespace
 
 void declareHomeRename(CommandSyntax& home, Workspace& workspace) {
-  CommandSyntax& rename = home.command("rename", "Renames a home, a room or any other object",
-                                       "Examples:\n"
-                                       "  nidus home rename room Kitchen Galley\n"
-                                       "  nidus home rename service \"Floor lamp/Lamp\" Glow");
+  CommandSyntax& rename =
+      home.command("rename", "Renames a home, a room or any other object",
+                   std::string("Examples:\n"
+                               "  nidus home rename room Kitchen Galley\n"
+                               "  nidus home rename service \"Floor lamp/Lamp\" Glow") +
+                       kExitStatuses);
   for (const ObjectKind kind : kObjectKinds) declareRenamingOf(kind, rename, workspace);
 }
 

@@ -4,6 +4,7 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/HomeEditing/HomeObjects.h"
 #include "nidus/HomeTree.h"
 #include "nidus/StandardStreams.h"
@@ -41,9 +42,11 @@ ExitStatus showHomes(const std::string& name, Workspace& workspace) {
 
 void declareHomeShow(CommandSyntax& home, Workspace& workspace) {
   const auto name = std::make_shared<std::string>();
-  CommandSyntax& syntax =
-      home.command("show", "Shows the homes as trees of rooms, accessories, services and values",
-                   "Names of types, attributes and values are those that commands use.");
+  CommandSyntax& syntax = home.command(
+      "show", "Shows the homes as trees of rooms, accessories, services and values",
+      std::string("Names of types, attributes and values are those that commands use.\n\n"
+                  "Example:\n  nidus home show \"Beach House\"") +
+          kExitStatuses);
   syntax.argument("HOME", *name, "The name or UUID of one home; without it all are shown");
   syntax.candidates("HOME", {{CandidateKind::homes}});
   syntax.run([name, &workspace] { return showHomes(*name, workspace); });

@@ -40,4 +40,26 @@ std::string withArticle(ObjectKind kind) {
   return (kind == ObjectKind::accessory ? "an " : "a ") + wordOf(kind);
 }
 
+std::string exampleName(ObjectKind kind) {
+  switch (kind) {
+    case ObjectKind::home:
+      return "\"Beach House\"";
+    case ObjectKind::room:
+      return "Kitchen";
+    case ObjectKind::zone:
+      return "Upstairs";
+    case ObjectKind::accessory:
+      return "\"Floor lamp\"";
+    case ObjectKind::service:
+      return "\"Floor lamp/Lamp\"";
+    case ObjectKind::group:
+      return "\"Reading corner\"";
+    case ObjectKind::scene:
+      return "\"Movie night\"";
+    case ObjectKind::trigger:
+      break;
+  }
+  return "\"At sunset\"";
+}
+
 }  // namespace nidus

@@ -15,4 +15,7 @@ void declareObjectArguments(CommandSyntax& syntax, ObjectWords& words);
 /// "a room", "an accessory".
 [[nodiscard]] std::string withArticle(ObjectKind kind);
 
+/// A name as an object of `kind` may have, quoted as on a command line: "Floor lamp/Lamp".
+[[nodiscard]] std::string exampleName(ObjectKind kind);
+
 }  // namespace nidus

@@ -4,6 +4,7 @@
 #include "HomePlatform/Json/JsonText.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Preferences/PreferenceReport.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Workspace.h"
@@ -119,9 +120,6 @@ ExitStatus unsetPreference(const PreferenceInput& input, Workspace& workspace) {
   return change(input.key, JsonValue(), workspace);
 }
 
-constexpr const char kStatuses[] =
-    "\n\nExit status: 0 success, 2 bad input, 4 the platform failed.";
-
 /// Declares the commands below `nidus preferences`.
 class PreferenceCommands {
  public:
@@ -157,7 +155,7 @@ class PreferenceCommands {
   [[nodiscard]] Below declare(const char* name, const char* help, const char* details,
                               Action action) const {
     const auto input = std::make_shared<PreferenceInput>();
-    CommandSyntax& syntax = preferences_.command(name, help, std::string(details) + kStatuses);
+    CommandSyntax& syntax = preferences_.command(name, help, std::string(details) + kExitStatuses);
     syntax.run([input, action, &workspace = workspace_] { return action(*input, workspace); });
     return {syntax, *input};
   }
@@ -178,7 +176,10 @@ class PreferenceCommands {
 void declarePreferences(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& preferences = program.command(
       "preferences", "Shows and changes preferences, and says what each one does now",
-      "They are kept in preferences.json in the data folder. Programs that run hear of a change.");
+      std::string(
+          "They are kept in preferences.json in the data folder. Programs that run hear of a "
+          "change.\n\nExample:\n  nidus preferences list") +
+          kExitStatuses);
   PreferenceCommands(preferences, workspace).declareAll();
 }
 

@@ -1,6 +1,7 @@
 #include "HomePlatform/Json/JsonText.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Workspace.h"
 
@@ -25,7 +26,9 @@ ExitStatus printRecords(Workspace& workspace) {
 void declareRecords(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& syntax =
       program.command("records", "Prints the objects that a filter is resolved against",
-                      "JSON lines, one record a line, in the order of the home.");
+                      std::string("JSON lines, one record a line, in the order of the home.\n\n"
+                                  "Example: how many are there?\n  nidus records | wc -l") +
+                          kExitStatuses);
   syntax.run([&workspace] { return printRecords(workspace); });
 }
 

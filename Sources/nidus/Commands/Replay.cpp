@@ -4,6 +4,7 @@
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Session.h"
 #include "nidus/StandardStreams.h"
 
@@ -25,7 +26,10 @@ void declareReplay(CommandSyntax& program) {
   const auto file = std::make_shared<std::string>();
   CommandSyntax& syntax = program.command(
       "replay", "Runs a scripted scenario and prints its transcript",
-      "The scenario runs on homes in memory; nothing of the data folder is read or written.");
+      std::string(
+          "The scenario runs on homes in memory; nothing of the data folder is read or written.\n\n"
+          "Example:\n  nidus replay scenario.json") +
+          kExitStatuses);
   syntax.requiredArgument("SCENARIO", *file, "A scenario document");
   syntax.candidates("SCENARIO", {{CandidateKind::files}});
   syntax.run([file] { return replayFile(*file); });

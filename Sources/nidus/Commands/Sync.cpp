@@ -46,7 +46,9 @@ ExitStatus synchronise(Workspace& workspace) {
 void declareSync(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& syntax = program.command(
       "sync", "Prints the names that the assistant learns",
-      "JSON lines: first the reset with its validity, then one entity a line with its anchor.");
+      "JSON lines: first the reset with its validity, then one entity a line with its anchor.\n\n"
+      "Example:\n  nidus sync\n\n"
+      "Exit status: 0 success, 2 bad input, 3 no reply, 4 the platform failed.");
   syntax.run([&workspace] { return synchronise(workspace); });
 }
 

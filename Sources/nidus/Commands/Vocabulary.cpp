@@ -4,6 +4,7 @@
 #include "HomePlatform/Metadata/VocabularyWriter.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/ExitStatusText.h"
 #include "nidus/Orders/WordChoice.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/VocabularyText.h"
@@ -44,13 +45,15 @@ void declareVocabulary(CommandSyntax& program, Workspace& workspace) {
   const auto options = std::make_shared<VocabularyOptions>();
   CommandSyntax& syntax = program.command(
       "vocabulary", "Lists the words that orders and commands can use",
-      "Without WORD all of them; with it the entry of that name, else those that contain it, and\n"
-      "what they stand for on the devices. Words of your own come from vocabulary.json in the "
-      "data\n"
-      "folder.\n\n"
-      "Example: what values does the climate mode take?\n"
-      "  nidus vocabulary climate\n\n"
-      "Exit status: 0 success, 2 no such word, 4 the platform failed.");
+      std::string(
+          "Without WORD all of them; with it the entry of that name, else those that contain it, "
+          "and\n"
+          "what they stand for on the devices. Words of your own come from vocabulary.json in the "
+          "data\n"
+          "folder.\n\n"
+          "Example: what values does the climate mode take?\n"
+          "  nidus vocabulary climate") +
+          kExitStatuses);
   syntax.argument("WORD", options->word, "The word to show, in either case");
   syntax.candidates("WORD", {{CandidateKind::attributes, CandidateKind::serviceTypes}});
   syntax.flag("--json", options->isJson, "Write a vocabulary document, as vocabulary.json is");
