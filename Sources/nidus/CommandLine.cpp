@@ -10,6 +10,7 @@
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/UsageErrors.h"
 #include "nidus/Workspace.h"
 
 namespace nidus {
@@ -23,6 +24,10 @@ constexpr const char kFirstHelp[] =
     "The options may stand before or after a command. Each command has a help of its own:\n"
     "nidus COMMAND --help\n\n"
     "Exit status: 0 success, 1 any other outcome, 2 bad input, 3 no reply, 4 the platform failed.";
+
+/// The same in the shell, which has words of its own and no tour.
+constexpr const char kShellHelp[] =
+    "help COMMAND tells more about one, exit leaves. Begin with home import FILE.";
 
 /// The check of a value: an empty one, as a script passes by mistake, must not count as none, and
 /// so turn an order for one room into one for all of the home.
@@ -120,25 +125,16 @@ void declareWorkspaceCommands(CommandSyntax& program, Workspace& workspace) {
 
 namespace {
 
-/// The command that the arguments have led to: "nidus home".
-std::string commandOf(const CLI::App& app) {
-  const auto below = app.get_subcommands();
-  return app.get_name() + (below.empty() ? "" : ' ' + commandOf(*below.front()));
-}
-
-ExitStatus reportUsage(const CLI::App& app, const CLI::ParseError& error) {
-  const auto unknown = app.remaining(true);
-  const bool isCommandMissing = dynamic_cast<const CLI::RequiredError*>(&error) != nullptr;
-  std::string reason = error.what();
-  if (isCommandMissing && !unknown.empty()) {
-    const bool isOption = unknown.front().rfind('-', 0) == 0;
-    reason = (isOption ? "there is no option " : "there is no command ") + unknown.front();
-  }
-  return report({Failure::Kind::badInput, reason + "; see " + commandOf(app) + " --help"});
+ExitStatus reportUsage(const UsageError& error, CommandPlace place) {
+  const bool isInShell = place == CommandPlace::shell;
+  const std::string help = isInShell ? "help" + error.command : "nidus" + error.command + " --help";
+  const std::string remedy =
+      error.meant.empty() ? "see " + help : "did you mean " + error.meant + '?';
+  return report({Failure::Kind::badInput, error.reason + "; " + remedy});
 }
 
 ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
-                       const std::function<ExitStatus()>& chosen) {
+                       const std::function<ExitStatus()>& chosen, CommandPlace place) {
   try {
     // The parser takes them from the end.
     std::reverse(words.begin(), words.end());
@@ -148,7 +144,7 @@ ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
   } catch (const CLI::CallForVersion& version) {
     return printText(std::string(version.what()) + '\n');
   } catch (const CLI::ParseError& error) {
-    return reportUsage(app, error);
+    return reportUsage(usageErrorOf(app, error), place);
   }
   return chosen();
 }
@@ -156,14 +152,14 @@ ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
 }  // namespace
 
 ExitStatus runCommand(std::vector<std::string> words,
-                      const std::function<void(CommandSyntax&)>& declare) {
+                      const std::function<void(CommandSyntax&)>& declare, CommandPlace place) {
   CLI::App app("Lets an assistant's commands act on a home.", "nidus");
   app.set_version_flag("--version", "nidus " NIDUS_VERSION);
-  app.footer(kFirstHelp);
+  app.footer(place == CommandPlace::shell ? kShellHelp : kFirstHelp);
   std::function<ExitStatus()> chosen;
   ParserSyntax program(app, chosen);
   declare(program);
-  return parseAndRun(app, std::move(words), chosen);
+  return parseAndRun(app, std::move(words), chosen, place);
 }
 
 int runCommandLine(int argc, const char* const* argv) {

@@ -1,4 +1,7 @@
+#include "nidus/CommandLine.h"
+#include "nidus/Completion/CommandOutline.h"
 #include "nidus/ProgramTest.h"
+#include "nidus/Workspace.h"
 
 namespace nidus {
 namespace {
@@ -91,9 +94,65 @@ TEST_F(ProgramTest, RefusesBadUsageOnOneLine) {
   }
 }
 
-TEST_F(ProgramTest, TellsUnknownOptionsFromUnknownCommands) {
-  EXPECT_THAT(runProgram({{"dance"}}).errors, HasSubstr("there is no command dance"));
-  EXPECT_THAT(runProgram({{"--dance"}}).errors, HasSubstr("there is no option --dance"));
+struct UsageCase {
+  std::vector<std::string> arguments;
+  std::string errors;
+};
+
+TEST_F(ProgramTest, TellsWhatIsWrongWithItsArguments) {
+  const UsageCase table[] = {
+      {{"dance"}, "there is no command dance; see nidus --help"},
+      {{"gett", "power"}, "there is no command gett; did you mean get?"},
+      {{"home", "shw"}, "there is no command shw; did you mean show?"},
+      {{"--dance"}, "there is no option --dance; see nidus --help"},
+      {{"get", "power", "--rom", "K"}, "there is no option --rom; did you mean --room?"},
+      {{"home", "import", "--merg=1"}, "there is no option --merg; did you mean --merge?"},
+      {{"sync", "--dat", "x"}, "there is no option --dat; did you mean --data?"},
+      {{"home", "add", "room", "A", "B"},
+       "there is no place for the argument B; see nidus home add room --help"},
+      {{"home", "add", "service", "Lamp", "Floor lamp", "light"},
+       "there is no place for the argument Floor lamp; see nidus home add service --help"},
+      {{"home"}, "a command is missing; see nidus home --help"},
+      {{"home", "import"}, "FILE is missing; see nidus home import --help"},
+      {{"home", "add", "service", "Lamp"},
+       "--accessory is missing; see nidus home add service --help"},
+      {{"--data"}, "--data has no value after it; see nidus --help"},
+      {{"home", "show", "--data"}, "--data has no value after it; see nidus home show --help"},
+      {{"get", "power", "--room", "A", "--room", "B"},
+       "--room is given more than once; see nidus get --help"},
+      {{"--data", ""}, "--data: the value is empty; see nidus --help"},
+  };
+  for (const UsageCase& usage : table) {
+    EXPECT_EQ(runProgram({usage.arguments}).errors, "nidus: " + usage.errors + '\n');
+  }
+}
+
+/// The words of `command` and of all below it, each with the option for help.
+std::vector<std::vector<std::string>> helpsOf(const CommandOutline& command,
+                                              std::vector<std::string> words = {}) {
+  std::vector<std::vector<std::string>> helps;
+  for (const auto& below : command.commands()) {
+    if (below->isHidden()) continue;
+    std::vector<std::string> longer = words;
+    longer.push_back(below->name());
+    const auto more = helpsOf(*below, longer);
+    helps.insert(helps.end(), more.begin(), more.end());
+  }
+  words.emplace_back("--help");
+  helps.push_back(words);
+  return helps;
+}
+
+TEST_F(ProgramTest, TellsExamplesAndExitStatusesOfEachCommand) {
+  Workspace workspace;
+  CommandOutline program;
+  declareProgram(program, workspace);
+  for (const auto& arguments : helpsOf(program)) {
+    const std::string help = runProgram({arguments}).output;
+    SCOPED_TRACE(::testing::PrintToString(arguments));
+    EXPECT_THAT(help, HasSubstr("\nExit status: "));
+    EXPECT_THAT(help, HasSubstr(arguments.size() > 1 ? "Example" : "nidus demo"));
+  }
 }
 
 TEST_F(ProgramTest, ReportsAnOutputThatIsFull) {

@@ -147,7 +147,7 @@ ExitStatus Shell::runWords(std::vector<std::string> words) {
                    first + " is run outside of the shell; leave with exit, then nidus " + first});
   }
   if (drop("help", words)) words.emplace_back("--help");
-  return runCommand(std::move(words), declare_);
+  return runCommand(std::move(words), declare_, CommandPlace::shell);
 }
 
 LineCompletion Shell::complete(std::string_view line) {

@@ -42,6 +42,13 @@ TEST_F(ShellCommandTest, NumbersBadLinesAndGoesOn) {
   EXPECT_THAT(end.output, HasSubstr("Cottage"));
 }
 
+TEST_F(ShellCommandTest, PointsToItsOwnHelp) {
+  EXPECT_THAT(runLines("xyzzy\n").errors, HasSubstr("no command xyzzy; see help\n"));
+  EXPECT_THAT(runLines("home xyzzy\n").errors, HasSubstr("no command xyzzy; see help home\n"));
+  const std::string help = runLines("help\n").output;
+  EXPECT_THAT(help, AllOf(HasSubstr("help COMMAND"), Not(HasSubstr("nidus demo"))));
+}
+
 TEST_F(ShellCommandTest, EndsWithTheHighestStatus) {
   const std::string silent = folder_.write("missing.json", readCommandLine("Attic"));
   EXPECT_EQ(runLines("perform '" + silent + "'\nhome show\n").exitStatus, 1);
