@@ -54,8 +54,8 @@ bool canAsk() { return isatty(STDIN_FILENO) == 1 && isatty(STDERR_FILENO) == 1; 
 
 bool ask(const std::string& question, EmptyAnswer empty) {
   const std::string choice = empty == EmptyAnswer::yes ? " [Y/n] " : " [y/N] ";
-  if (!writeWhole(STDERR_FILENO, onOneLine(question) + choice)) return false;
   const LineEndOnInterrupt lineEnd;
+  if (!writeWhole(STDERR_FILENO, onOneLine(question) + choice)) return false;
   const auto answer = readAnswer();
   if (!answer) {
     static_cast<void>(writeWhole(STDERR_FILENO, "\n"));
