@@ -38,6 +38,7 @@ void forEachWatched(const std::vector<HomeData>& homes, const WatchFilter& filte
 
 std::vector<std::string> namesOf(const std::vector<HomeData>& homes) {
   std::vector<std::string> names;
+  names.reserve(homes.size());
   for (const HomeData& home : homes) names.push_back(home.name.str());
   return names;
 }
