@@ -97,8 +97,9 @@ std::string textOf(const PreferenceReport& report) {
 }
 
 JsonValue jsonOf(const PreferenceReport& report) {
+  const JsonValue value = report.value ? *report.value : JsonValue();
   return {JsonValue::Object{{"key", {report.name}},
-                            {"value", report.value.value_or(JsonValue())},
+                            {"value", value},
                             {"purpose", {report.purpose}},
                             {"effect", {report.effect}}}};
 }
