@@ -49,8 +49,9 @@ class LineEditor::Terminal {
     set(EL_PROMPT, &Terminal::prompt);
     set(EL_EDITOR, "emacs");
     set(EL_HIST, &::history, history_.get());
-    set(EL_ADDFN, "nidus-complete", "Complete the word", &Terminal::complete);
-    set(EL_ADDFN, "nidus-discard", "Throw the line away", &Terminal::discard);
+    // The library keeps wide texts as they are; of others it keeps copies that it never frees.
+    el_wset(editor_.get(), EL_ADDFN, L"nidus-complete", L"Complete the word", &Terminal::complete);
+    el_wset(editor_.get(), EL_ADDFN, L"nidus-discard", L"Throw the line away", &Terminal::discard);
     set(EL_BIND, "^I", "nidus-complete", nullptr);
     set(EL_BIND, "^R", "em-inc-search-prev", nullptr);
     // Only while a line is edited: during an order the key still interrupts.
