@@ -22,8 +22,10 @@ struct Failure {
 template <class T>
 class [[nodiscard]] Result {
  public:
-  Result(T value) : content_(std::move(value)) {}            // NOLINT(google-explicit-constructor)
-  Result(Failure failure) : content_(std::move(failure)) {}  // NOLINT(google-explicit-constructor)
+  // NOLINTBEGIN(google-explicit-constructor): a function returns either as it is
+  Result(T value) : content_(std::move(value)) {}
+  Result(Failure failure) : content_(std::move(failure)) {}
+  // NOLINTEND(google-explicit-constructor)
 
   explicit operator bool() const noexcept { return std::holds_alternative<T>(content_); }
   /// The value; only when there is one.

@@ -89,12 +89,11 @@ class CheckingHandler {
 
   explicit CheckingHandler(JsonEvents& events) : events_(events) {}
 
+  // NOLINTBEGIN(readability-identifier-naming): the parser calls these by its own names
   bool null() { return scalar({nullptr}); }
   bool boolean(bool value) { return scalar({value}); }
-  bool number_integer(number_integer_t value) {  // NOLINT(readability-identifier-naming): parser's
-    return scalar({std::int64_t{value}});
-  }
-  bool number_unsigned(number_unsigned_t value) {  // NOLINT(readability-identifier-naming)
+  bool number_integer(number_integer_t value) { return scalar({std::int64_t{value}}); }
+  bool number_unsigned(number_unsigned_t value) {
     if (value > static_cast<number_unsigned_t>(std::numeric_limits<std::int64_t>::max())) {
       failBeyondRange(true);
     }
@@ -102,7 +101,6 @@ class CheckingHandler {
   }
   /// The parser's own value is a 64-bit float, and rounding twice may miss the nearest one: the
   /// text decides.
-  // NOLINTNEXTLINE(readability-identifier-naming)
   bool number_float(number_float_t roughly, const string_t& text) {
     if (isInteger(text)) failBeyondRange(true);
     std::string number = text;
@@ -112,7 +110,7 @@ class CheckingHandler {
   bool string(string_t& text) { return scalar({std::move(text)}); }
   bool binary(binary_t&) { return false; }
 
-  bool start_object(std::size_t) {  // NOLINT(readability-identifier-naming)
+  bool start_object(std::size_t) {
     checkDepth();
     events_.beginObject(path_);
     path_.enterObject();
@@ -125,26 +123,25 @@ class CheckingHandler {
     events_.key(key, path_);
     return true;
   }
-  bool end_object() {  // NOLINT(readability-identifier-naming)
+  bool end_object() {
     openObjects_.pop_back();
     path_.leave();
     events_.endObject(path_);
     path_.endValue();
     return true;
   }
-  bool start_array(std::size_t) {  // NOLINT(readability-identifier-naming)
+  bool start_array(std::size_t) {
     checkDepth();
     events_.beginArray(path_);
     path_.enterArray();
     return true;
   }
-  bool end_array() {  // NOLINT(readability-identifier-naming)
+  bool end_array() {
     path_.leave();
     events_.endArray(path_);
     path_.endValue();
     return true;
   }
-  // NOLINTNEXTLINE(readability-identifier-naming)
   bool parse_error(std::size_t, const std::string& token, const nlohmann::json::exception& error) {
     constexpr int kNumberOverflow = 406;
     if (error.id == kNumberOverflow) failBeyondRange(isInteger(token));
@@ -157,6 +154,7 @@ class CheckingHandler {
     }
     throw JsonError{"", message};
   }
+  // NOLINTEND(readability-identifier-naming)
 
  private:
   /// Whether the document has ended, so that what follows is too much.
