@@ -9,6 +9,12 @@
 namespace nidus {
 namespace {
 
+/// The program that is tried: the one that was built, unless the environment names another.
+std::filesystem::path program() {
+  const char* const given = std::getenv("NIDUS_PROGRAM");
+  return given ? given : NIDUS_PROGRAM;
+}
+
 std::string quoted(const std::filesystem::path& path) { return "'" + path.string() + "'"; }
 
 }  // namespace
@@ -18,7 +24,7 @@ ReplayRun runReplay(const std::filesystem::path& scenario, const std::string& en
   const auto output = folder.path() / "output";
   const auto errors = folder.path() / "errors";
   // The shell is replaced by the program, so that the program's own end is seen.
-  const std::string command = "ulimit -c 0; exec env " + environment + " " + quoted(NIDUS_PROGRAM) +
+  const std::string command = "ulimit -c 0; exec env " + environment + " " + quoted(program()) +
                               " replay " + quoted(scenario) + " </dev/null >" + quoted(output) +
                               " 2>" + quoted(errors);
   const int status = std::system(command.c_str());

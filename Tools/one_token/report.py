@@ -1,0 +1,73 @@
+"""The report of the changes that were tried, and the list of those that are known to go unnoticed.
+"""
+
+import re
+import threading
+
+
+class Report:
+    """A file with one line a change. What stands there already is not tried again, as long as the
+    file that it changes is the same."""
+
+    def __init__(self, path, hashes):
+        self.path = path
+        self.hashes = hashes  # Of the sources, by file.
+        self.lock = threading.Lock()
+        self.verdicts = {}
+        if path.exists():
+            self._read()
+        self._write()
+
+    def forget_unnoticed(self):
+        """Those are tried again, because tests may have been added."""
+        self.verdicts = {name: verdict for name, verdict in self.verdicts.items()
+                         if verdict != "nobody"}
+
+    def add(self, change, verdict):
+        with self.lock:
+            self.verdicts[change.name()] = verdict
+            with self.path.open("a", encoding="utf-8") as file:
+                file.write(line_of(change.name(), verdict))
+
+    def _read(self):
+        lines = self.path.read_text(encoding="utf-8").splitlines()
+        known = {line for line in lines if line.startswith("# ")}
+        same = {file for file in self.hashes if self._head(file) in known}
+        self.verdicts = dict(parsed(line) for line in lines if line.split(":")[0] in same)
+
+    def _write(self):
+        lines = [self._head(file) + "\n" for file in self.hashes]
+        lines += [line_of(name, verdict) for name, verdict in self.verdicts.items()]
+        self.path.write_text("".join(lines), encoding="utf-8")
+
+    def _head(self, file):
+        return f"# {file} {self.hashes[file]}"
+
+
+def line_of(name, verdict):
+    words = {"nobody": "not noticed", "compiler": "does not compile"}
+    return f"{name}: {words.get(verdict, 'noticed by ' + verdict)}\n"
+
+
+def parsed(line):
+    name, words = line.rsplit(": ", 1)
+    verdicts = {"not noticed": "nobody", "does not compile": "compiler"}
+    return name, verdicts.get(words, words.removeprefix("noticed by "))
+
+
+def read_reasons(path):
+    """Why changes go unnoticed, by their known names: each paragraph holds names and, indented, the
+    reason that they share."""
+    reasons, names = {}, []
+    for line in path.read_text(encoding="utf-8").splitlines():
+        if line.startswith("#"):
+            continue
+        if not line.strip():
+            names = []
+        elif line[0].isspace():
+            for name in names:
+                reasons[name] = (reasons[name] + " " + line.strip()).strip()
+        else:
+            names.append(line)
+            reasons[line] = ""
+    return reasons
