@@ -11,7 +11,7 @@ void inFreshProcess(const std::function<void()>& body) {
   EXPECT_EXIT(
       {
         body();
-        std::_Exit(::testing::Test::HasFailure() ? EXIT_FAILURE : EXIT_SUCCESS);
+        std::exit(::testing::Test::HasFailure() ? EXIT_FAILURE : EXIT_SUCCESS);
       },
       ::testing::ExitedWithCode(EXIT_SUCCESS), "");
 }
