@@ -6,6 +6,8 @@
 #include <string_view>
 #include <system_error>
 
+#include "HomePlatform/System/TrustedPlace.h"
+
 namespace nidus {
 namespace {
 
@@ -31,6 +33,7 @@ Result<std::filesystem::path> findAssistantModule() {
 }
 
 Result<const NDAssistantModule*> openAssistantModule(const std::filesystem::path& file) {
+  if (Status failure = checkTrustedWay(file)) return *failure;
   // Never unloaded: callbacks that the module has handed out may be called until the process ends.
   void* library = dlopen(file.c_str(), RTLD_NOW | RTLD_LOCAL | RTLD_NODELETE);
   if (!library) {

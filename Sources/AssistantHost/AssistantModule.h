@@ -12,9 +12,10 @@ namespace nidus {
 /// folder nor the environment has a say. A failure names the file that is missing.
 [[nodiscard]] Result<std::filesystem::path> findAssistantModule();
 
-/// Opens the module in `file` and checks that it was built for this program, before anything else
-/// of it is used. The module stays open until the process ends; the result is never null. Opening
-/// it again gives the same module. A failure names the file and the remedy.
+/// Opens the module in `file`, unless others may change it or what leads there, and checks that it
+/// was built for this program, before anything else of it is used. The module stays open until the
+/// process ends; the result is never null. Opening it again gives the same module. A failure names
+/// the file and the remedy.
 [[nodiscard]] Result<const NDAssistantModule*> openAssistantModule(
     const std::filesystem::path& file);
 

@@ -5,6 +5,8 @@
 #include <string>
 #include <system_error>
 
+#include "HomePlatform/System/TrustedPlace.h"
+
 namespace nidus {
 
 Result<TemporaryFolder> TemporaryFolder::make() {
@@ -16,7 +18,9 @@ Result<TemporaryFolder> TemporaryFolder::make() {
     return Failure{Failure::Kind::platform,
                    name + ": cannot be made (" + reason + "); set TMPDIR to a writable folder"};
   }
-  return TemporaryFolder(name);
+  TemporaryFolder made(name);
+  if (Status failure = checkTrustedWay(name)) return *failure;
+  return made;
 }
 
 TemporaryFolder::~TemporaryFolder() {

@@ -1,12 +1,16 @@
 #include <sqlite3.h>
+#include <sys/stat.h>
 
+#include "Support/FileModes.h"
 #include "nidus/ProgramTest.h"
 
 namespace nidus {
 namespace {
 
+using ::testing::EndsWith;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
+using ::testing::IsSupersetOf;
 
 /// A connection of the test's own to a database.
 class Connection {
@@ -75,6 +79,46 @@ TEST_F(DataFolderTest, MustBeKnown) {
   const ProgramEnd end = runProgram(exporting);
   EXPECT_EQ(end.exitStatus, 2);
   EXPECT_THAT(end.errors, IsOneFailure("no data folder is known"));
+}
+
+TEST_F(DataFolderTest, IsItsOwnersAloneWhateverTheMask) {
+  for (const mode_t mask : {0000U, 0077U}) {
+    SCOPED_TRACE(mask);
+    const FileCreationMask set(mask);
+    std::filesystem::remove_all(data());
+    importSmallHome();
+    ProgramProcess process(start({"perform"}));
+    process.write(setCommandLine("Lamp", true) + "\n");
+    ASSERT_TRUE(process.readLine());
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(data())) {
+      names.push_back(entry.path().filename().string());
+      EXPECT_EQ(permissionsOf(entry.path()), 0600U) << entry.path();
+    }
+    EXPECT_THAT(names, IsSupersetOf({"home.db", "home.db-shm", "home.db-wal", "preferences.json"}));
+    EXPECT_EQ(permissionsOf(data()), 0700U);
+  }
+}
+
+TEST_F(DataFolderTest, MakesTheFoldersAboveForTheirOwnerToo) {
+  const FileCreationMask set(0000);
+  ASSERT_EQ(runProgram({{"--data", folder_.file("a/b/data"), "home", "export"}}).exitStatus, 0);
+  for (const char* name : {"a", "a/b", "a/b/data"}) {
+    EXPECT_EQ(permissionsOf(folder_.path() / name), 0700U) << name;
+  }
+}
+
+TEST_F(DataFolderTest, MustNotBeOthersToChange) {
+  importSmallHome();
+  for (const char* name : {"data", "data/home.db", "data/preferences.json"}) {
+    const std::string place = folder_.file(name);
+    const auto before = permissionsOf(place);
+    ::chmod(place.c_str(), before | 0020U);
+    expectPlatformFailure(place + ": others may change it");
+    EXPECT_THAT(run({"get", "power"}).errors, EndsWith("; chmod go-w " + place + "\n"));
+    ::chmod(place.c_str(), before);
+  }
+  EXPECT_EQ(run({"home", "export"}).exitStatus, 0);
 }
 
 TEST_F(DataFolderTest, FailsBelowAFile) {

@@ -59,6 +59,15 @@ TEST_F(HomeEditTest, ShowsTheDocumentToItsOwnerAlone) {
   EXPECT_THAT(end.output, HasSubstr("mode 600\n"));
 }
 
+TEST_F(HomeEditTest, MustNotLieWhereOthersMayExchangeIt) {
+  std::filesystem::permissions(temporary(), std::filesystem::perms(0777));
+  const ProgramEnd end = runProgram(editing(kRename, true));
+  EXPECT_EQ(end.exitStatus, 4);
+  EXPECT_THAT(end.errors, IsOneFailure(temporary() + ": others may change it"));
+  EXPECT_EQ(exported(), before_);
+  EXPECT_TRUE(isNothingLeft());
+}
+
 TEST_F(HomeEditTest, ChangesNothingWithoutAnEdit) {
   for (const char* script : {"true", "echo >> \"$1\""}) {
     const ProgramEnd end = runProgram(editing(script, true));

@@ -1,8 +1,11 @@
+#include <sys/stat.h>
+
 #include "nidus/ProgramTest.h"
 
 namespace nidus {
 namespace {
 
+using ::testing::EndsWith;
 using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 
@@ -44,6 +47,22 @@ TEST_F(InstalledModuleTest, MustBeALibrary) {
 TEST_F(InstalledModuleTest, MustHaveTheInterface) {
   install(NIDUS_OTHER_INTERFACE_MODULE);
   expectModuleFailure("offers interface");
+}
+
+TEST_F(InstalledModuleTest, MustNotBeOthersToChange) {
+  install(NIDUS_SILENT_MODULE);
+  for (const char* name : {"lib/nidus/NidusAssistant.so", "lib/nidus", "lib"}) {
+    const std::string place = folder_.file(name);
+    ::chmod(place.c_str(), 0775);
+    const ProgramEnd end = runInstalled({"sync"});
+    EXPECT_EQ(end.exitStatus, 4);
+    EXPECT_THAT(end.output, IsEmpty());
+    EXPECT_THAT(end.errors, IsOneFailure(place + ": others may change it"));
+    EXPECT_THAT(end.errors, EndsWith("; chmod go-w " + place + "\n"));
+    EXPECT_THAT(runInstalled({"doctor"}).output,
+                HasSubstr("attention  plug-in\n  attention  " + place + ": others may change it"));
+    ::chmod(place.c_str(), 0755);
+  }
 }
 
 TEST_F(InstalledModuleTest, IsNotLookedForInTheWorkingFolder) {

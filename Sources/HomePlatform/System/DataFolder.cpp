@@ -2,13 +2,17 @@
 
 #include <fcntl.h>
 #include <sys/file.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
+#include <array>
 #include <cerrno>
 #include <cstdlib>
 #include <string>
 #include <system_error>
+
+#include "HomePlatform/System/Preferences.h"
+#include "HomePlatform/System/PrivateFiles.h"
+#include "HomePlatform/System/TrustedPlace.h"
 
 namespace nidus {
 namespace {
@@ -23,13 +27,26 @@ Failure makeFailure(const std::filesystem::path& folder, int error) {
   return folderFailure(folder, "the data folder cannot be made", error);
 }
 
-Status makeFolder(const std::filesystem::path& folder) {
-  std::error_code error;
-  const std::filesystem::path parent = std::filesystem::absolute(folder, error).parent_path();
-  if (!error) std::filesystem::create_directories(parent, error);
-  if (error) return makeFailure(folder, error.value());
-  if (::mkdir(folder.c_str(), S_IRWXU) == 0 || errno == EEXIST) return std::nullopt;
-  return makeFailure(folder, errno);
+/// A folder in which there is something already may have to be readable for what else is in it.
+void keepFolderPrivate(const std::filesystem::path& folder) {
+  std::error_code ignored;
+  if (!isOpenToOthers(folder)) return;
+  if (std::filesystem::is_empty(folder, ignored)) keepPrivate(folder);
+}
+
+/// The log of the database and its index hold values of the home like the database itself.
+std::array<std::string, 5> ownFiles() {
+  const std::string database = kDatabaseFile;
+  return {database, database + "-wal", database + "-shm", Preferences::kFileName, kVocabularyFile};
+}
+
+Status checkFiles(const std::filesystem::path& folder) {
+  for (const std::string& name : ownFiles()) {
+    const auto file = folder / name;
+    if (Status failure = checkTrusted(file)) return failure;
+    keepPrivate(file);
+  }
+  return std::nullopt;
 }
 
 }  // namespace
@@ -39,13 +56,17 @@ Status prepareDataFolder(const std::filesystem::path& folder) {
   const bool exists = std::filesystem::exists(folder, error);
   if (error) return folderFailure(folder, "the data folder cannot be opened", error.value());
   if (!exists) {
-    if (Status failure = makeFolder(folder)) return failure;
+    if (const int problem = makePrivateFolder(folder)) return makeFailure(folder, problem);
   }
   if (!std::filesystem::is_directory(folder, error)) {
     return folderFailure(folder, "the data folder cannot be opened", ENOTDIR);
   }
-  if (::access(folder.c_str(), R_OK | W_OK | X_OK) == 0) return std::nullopt;
-  return folderFailure(folder, "the data folder cannot be written", errno);
+  if (Status failure = checkTrustedWay(folder)) return failure;
+  if (::access(folder.c_str(), R_OK | W_OK | X_OK) != 0) {
+    return folderFailure(folder, "the data folder cannot be written", errno);
+  }
+  keepFolderPrivate(folder);
+  return checkFiles(folder);
 }
 
 Status tryDataFolder(const std::filesystem::path& folder) {

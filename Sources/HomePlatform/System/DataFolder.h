@@ -11,8 +11,9 @@ namespace nidus {
 inline constexpr const char* kDatabaseFile = "home.db";
 inline constexpr const char* kVocabularyFile = "vocabulary.json";
 
-/// Makes sure that `folder` is there and may be written: it is made, readable by its owner alone,
-/// when it is missing. An existing folder is left as it is.
+/// Makes sure that `folder` is there and may be written: it is made, open to its owner alone, when
+/// it is missing. Fails when others may change it, one of its files or what leads there. The
+/// files and an empty folder are closed to others; a folder that holds something is left as it is.
 [[nodiscard]] Status prepareDataFolder(const std::filesystem::path& folder);
 
 /// Why a folder that is missing could not be made; none when it could. Tries it with another one in

@@ -1,4 +1,5 @@
 #include "HomePlatform/System/Preferences.h"
+#include "HomePlatform/System/ShellWord.h"
 #include "nidus/Doctor/Checks.h"
 #include "nidus/Doctor/Remedy.h"
 #include "nidus/Preferences/PreferenceKeys.h"

@@ -1,15 +1,11 @@
 #pragma once
 
 #include <string>
-#include <string_view>
 
 #include "HomePlatform/Result.h"
 #include "nidus/Doctor/Finding.h"
 
 namespace nidus {
-
-/// `text` as one word of a shell's command line, in quotes where it needs them.
-[[nodiscard]] std::string shellWord(std::string_view text);
 
 /// How a command names `object`, a room or something else with a UUID. A name could belong to
 /// several, or be another one by the time that the command is typed.

@@ -9,6 +9,7 @@
 #include <system_error>
 
 #include "HomePlatform/System/FileDescriptor.h"
+#include "HomePlatform/System/PrivateFiles.h"
 #include "nidus/FileReplacement.h"
 #include "nidus/Settings.h"
 #include "nidus/StandardStreams.h"
@@ -33,9 +34,7 @@ std::vector<std::string> HistoryFile::lines() const {
 
 Status HistoryFile::add(const std::string& line) const {
   // What cannot be made here shows when the file is opened.
-  std::error_code ignored;
-  std::filesystem::create_directories(file_.parent_path().parent_path(), ignored);
-  ::mkdir(file_.parent_path().c_str(), S_IRWXU);
+  static_cast<void>(makePrivateFolder(file_.parent_path()));
   const FileDescriptor file(
       ::open(file_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, S_IRUSR | S_IWUSR));
   if (file && writeWhole(file.get(), line + '\n')) return std::nullopt;

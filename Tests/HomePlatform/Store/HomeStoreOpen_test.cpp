@@ -1,6 +1,5 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sys/stat.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -13,6 +12,7 @@
 #include "HomePlatform/Store/Schema.h"
 #include "HomePlatform/Support/RandomHome.h"
 #include "HomePlatform/Support/Unprivileged.h"
+#include "Support/FileModes.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
@@ -49,22 +49,16 @@ class OpenHomeStoreTest : public testing::Test {
   TestFolder folder_;
 };
 
-mode_t modeOf(const fs::path& path) {
-  struct stat status {};
-  EXPECT_EQ(::stat(path.c_str(), &status), 0) << path;
-  return status.st_mode & 0777;
-}
-
 TEST_F(OpenHomeStoreTest, MakesFolderAndFilesForTheirOwner) {
   const fs::path nested = folder() / "a" / "b" / "home.db";
   const auto store = HomeStore::open(nested);
   ASSERT_TRUE(store);
   ASSERT_FALSE((*store)->replaceHomes({}));
-  EXPECT_EQ(modeOf(folder() / "a"), 0700U);
-  EXPECT_EQ(modeOf(folder() / "a" / "b"), 0700U);
-  EXPECT_EQ(modeOf(nested), 0600U);
-  EXPECT_EQ(modeOf(nested.string() + "-wal"), 0600U);
-  EXPECT_EQ(modeOf(nested.string() + "-shm"), 0600U);
+  EXPECT_EQ(permissionsOf(folder() / "a"), 0700U);
+  EXPECT_EQ(permissionsOf(folder() / "a" / "b"), 0700U);
+  EXPECT_EQ(permissionsOf(nested), 0600U);
+  EXPECT_EQ(permissionsOf(nested.string() + "-wal"), 0600U);
+  EXPECT_EQ(permissionsOf(nested.string() + "-shm"), 0600U);
 }
 
 TEST_F(OpenHomeStoreTest, UsesWriteAheadLogAndForeignKeys) {

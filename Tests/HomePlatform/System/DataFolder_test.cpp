@@ -4,21 +4,18 @@
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 
+#include <array>
 #include <atomic>
 #include <optional>
 #include <thread>
 
+#include "Support/FileModes.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
 namespace {
 
 using testing::StartsWith;
-
-unsigned permissionsOf(const std::filesystem::path& folder) {
-  struct stat status = {};
-  return ::stat(folder.c_str(), &status) == 0 ? status.st_mode & 0777U : 0;
-}
 
 TEST(DataFolderTest, MakesFolderWithItsParents) {
   const TestFolder folder;
@@ -27,11 +24,53 @@ TEST(DataFolderTest, MakesFolderWithItsParents) {
   EXPECT_EQ(permissionsOf(made), 0700U);
 }
 
-TEST(DataFolderTest, LeavesExistingFolderAsItIs) {
+TEST(DataFolderTest, ClosesAnEmptyFolderToOthers) {
   const TestFolder folder;
   ASSERT_EQ(::chmod(folder.path().c_str(), 0755), 0);
   EXPECT_FALSE(prepareDataFolder(folder.path()));
+  EXPECT_EQ(permissionsOf(folder.path()), 0700U);
+}
+
+TEST(DataFolderTest, LeavesAFolderWithSomethingInItAsItIs) {
+  const TestFolder folder;
+  folder.write("page.html", "");
+  ASSERT_EQ(::chmod(folder.path().c_str(), 0755), 0);
+  EXPECT_FALSE(prepareDataFolder(folder.path()));
   EXPECT_EQ(permissionsOf(folder.path()), 0755U);
+}
+
+constexpr std::array kFiles = {"home.db", "home.db-wal", "home.db-shm", "preferences.json",
+                               "vocabulary.json"};
+
+TEST(DataFolderTest, ClosesItsFilesToOthers) {
+  const TestFolder folder;
+  for (const char* name : kFiles) ::chmod(folder.write(name, "").c_str(), 0644);
+  EXPECT_FALSE(prepareDataFolder(folder.path()));
+  for (const char* name : kFiles) EXPECT_EQ(permissionsOf(folder.path() / name), 0600U) << name;
+}
+
+TEST(DataFolderTest, RefusesFilesThatOthersMayChange) {
+  for (const char* name : kFiles) {
+    const TestFolder folder;
+    ::chmod(folder.write(name, "").c_str(), 0660);
+    const Status failure = prepareDataFolder(folder.path());
+    ASSERT_TRUE(failure) << name;
+    EXPECT_THAT(failure->message, StartsWith(folder.file(name) + ": others may change it"));
+  }
+}
+
+TEST(DataFolderTest, RefusesAFolderThatOthersMayChange) {
+  const TestFolder folder;
+  const auto data = folder.path() / "data";
+  EXPECT_FALSE(prepareDataFolder(data));
+  for (const auto& place : {data, folder.path()}) {
+    ASSERT_EQ(::chmod(place.c_str(), 0770), 0);
+    const Status failure = prepareDataFolder(data);
+    ASSERT_TRUE(failure);
+    EXPECT_THAT(failure->message, StartsWith(place.string() + ": others may change it"));
+    EXPECT_EQ(permissionsOf(place), 0770U);
+    ASSERT_EQ(::chmod(place.c_str(), 0700), 0);
+  }
 }
 
 TEST(DataFolderTest, RefusesWhatIsNoFolder) {

@@ -32,6 +32,24 @@ TEST_F(DataFolderCheckTest, FindsAFolderThatOthersMayChange) {
                                          HasSubstr("chmod go-w " + folder_.path().string()))));
 }
 
+TEST_F(DataFolderCheckTest, FindsAFolderThatOthersMayRead) {
+  for (const mode_t mode : {0750U, 0701U}) {
+    ::chmod(folder_.path().c_str(), mode);
+    EXPECT_THAT(findingsOf(checkDataFolder),
+                ElementsAre(NeedsAttention(folder_.path().string(),
+                                           HasSubstr("chmod go-rwx " + folder_.path().string()))));
+  }
+}
+
+TEST_F(DataFolderCheckTest, FindsAPlaceThatOthersMayExchange) {
+  examination_.folder = folder_.path() / "data";
+  std::filesystem::create_directory(examination_.folder);
+  ::chmod(examination_.folder.c_str(), 0700);
+  ::chmod(folder_.path().c_str(), 0770);
+  EXPECT_THAT(findingsOf(checkDataFolder),
+              ElementsAre(NeedsAttention(folder_.path().string(), HasSubstr("chmod go-w"))));
+}
+
 TEST_F(DataFolderCheckTest, FindsFilesThatOthersMayChange) {
   ::chmod(folder_.write("home.db", "").c_str(), 0620);
   ::chmod(folder_.write("vocabulary.json", "").c_str(), 0602);

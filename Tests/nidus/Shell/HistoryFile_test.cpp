@@ -2,6 +2,7 @@
 
 #include <gmock/gmock.h>
 
+#include "Support/FileModes.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
@@ -22,12 +23,13 @@ TEST(HistoryFileTest, KeepsLinesInOrder) {
 }
 
 TEST(HistoryFileTest, IsForItsOwnerAlone) {
-  namespace fs = std::filesystem;
   const TestFolder folder;
-  const fs::path file = folder.file("state/nidus/history");
+  const FileCreationMask mask(0000);
+  const std::filesystem::path file = folder.file("state/nidus/history");
   EXPECT_FALSE(HistoryFile(file).add("home show"));
-  EXPECT_EQ(fs::status(file).permissions(), fs::perms::owner_read | fs::perms::owner_write);
-  EXPECT_EQ(fs::status(file.parent_path()).permissions(), fs::perms::owner_all);
+  EXPECT_EQ(permissionsOf(file), 0600U);
+  EXPECT_EQ(permissionsOf(file.parent_path()), 0700U);
+  EXPECT_EQ(permissionsOf(file.parent_path().parent_path()), 0700U);
 }
 
 TEST(HistoryFileTest, CutsALongFile) {
