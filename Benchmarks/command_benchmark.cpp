@@ -1,82 +1,99 @@
-#include <benchmark/benchmark.h>
-
-#include <cstdlib>
-#include <memory>
-#include <string_view>
-
-#include "Assistant/NDAssistantCommand.h"
-#include "BenchmarkHome.h"
-#include "HomePlatform/HomePlatform.h"
+#include "BenchmarkPlatform.h"
+#include "Floors.h"
+#include "Measurement.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
+#include "Requests.h"
 
 namespace nidus {
 namespace {
 
-/// A platform in memory with its threads, registered for as long as it lives.
-class BenchmarkPlatform {
- public:
-  explicit BenchmarkPlatform(std::size_t services) {
-    auto opened = HomePlatform::open({.logSink = [](const NDSystemLogMessage&) {}});
-    if (!opened) std::abort();
-    platform_ = *opened;
-    if (platform_->importHomes(benchmarkHomes(services), false)) std::abort();
-    if (!NDPlatform::registerPlatform(platform_).empty()) std::abort();
-  }
-  ~BenchmarkPlatform() {
-    platform_->shutDown();
-    NDPlatform::unregisterPlatform(platform_);
-  }
-  BenchmarkPlatform(const BenchmarkPlatform&) = delete;
-  BenchmarkPlatform& operator=(const BenchmarkPlatform&) = delete;
+using Kind = BenchmarkPlatform::Kind;
 
-  /// Performs one command to its end; gives the number of replies.
-  std::size_t perform(const VAHACommand& request) {
-    std::size_t replies = 0;
-    bool isOver = false;
-    {
-      const auto mainQueue = platform_->mainQueue();
-      std::shared_ptr<void> end(
-          nullptr, [&isOver, mainQueue](void*) { mainQueue->async([&isOver] { isOver = true; }); });
-      std::make_shared<NDAssistantCommand>(request)->performWithCompletion(
-          [&replies, end](const NDDictionary&) { ++replies; });
+NDString lastName(std::size_t services, std::size_t nameLength) {
+  return numberedName(kServiceWord, services - 1, nameLength);
+}
+
+/// A whole command with one target; its floor is the snapshot and the filter that it cannot do
+/// without.
+void BM_CommandOne(benchmark::State& state, Kind kind, std::size_t nameLength, Row row) {
+  const auto services = static_cast<std::size_t>(state.range(0));
+  const BenchmarkPlatform platform(kind, {services, nameLength});
+  const BrightnessRequest request(VAHAActionTypeGETValue, lastName(services, nameLength));
+  const auto& filter = static_cast<const VAHASearchCriteriaFilter&>(*request.filter());
+  if (platform.perform(request) != 1) return state.SkipWithError("not one result");
+  const auto gather = platform.gather();
+  if (services < 1'000) row.goal = 0;
+  measureRow(
+      state, row, [&] { benchmark::DoNotOptimize(platform.perform(request)); },
+      [&] {
+        NDAssistantCommand command(request);
+        command.setMetadata(NDNAPMetadata::getSharedInstance());
+        command.setNidusObjects(gather->gatherNidusObjects());
+        benchmark::DoNotOptimize(command.objectsWithSearchFilter_inHome(filter, nullptr));
+      });
+}
+
+/// What each target adds to a command with one; its floor is a result made by hand for each.
+void BM_CommandAll(benchmark::State& state, Kind kind, std::size_t nameLength,
+                   std::string_view actionType, const Row& row) {
+  const auto services = static_cast<std::size_t>(state.range(0));
+  const BenchmarkPlatform platform(kind, {services, nameLength});
+  const BrightnessRequest one(actionType, lastName(services, nameLength));
+  const BrightnessRequest all(actionType, nullptr);
+  if (platform.perform(all) != services) return state.SkipWithError("not a result for each");
+  std::vector<AnswerTexts> texts;
+  for (const HomeObjectRecord& record : platform.gather()->gatherNidusObjects()) {
+    if (record.objectServiceType && texts.size() + 1 < services) {
+      texts.push_back({record.objectName, record.objectType, NDString("LIGHT"), record.objectRoom,
+                       record.objectHome});
     }
-    platform_->mainQueue()->runUntil([&isOver] { return isOver; });
-    return replies;
   }
-
- private:
-  std::shared_ptr<HomePlatform> platform_;
-};
-
-struct Request : VAHACommand {
-  Request(NDString serviceName, std::string_view type, std::string_view attribute) {
-    auto filter = std::make_shared<VAHASearchCriteriaFilter>();
-    filter->setServiceType("LIGHT");
-    filter->setServiceName(std::move(serviceName));
-    setFilter(std::move(filter));
-    auto action = std::make_shared<VAHAAction>();
-    action->setActionType(type);
-    action->setAttribute(attribute);
-    setActions({std::move(action)});
-  }
-};
-
-/// A whole command, threads and hops included: one target among `range(0)` services.
-void BM_ReadOne(benchmark::State& state) {
-  BenchmarkPlatform platform(static_cast<std::size_t>(state.range(0)));
-  const Request request("Lamp 5", VAHAActionTypeGETValue, "POWER");
-  for (auto _ : state) benchmark::DoNotOptimize(platform.perform(request));
+  measureRow(
+      state, row, [&] { benchmark::DoNotOptimize(platform.perform(all)); },
+      [&texts] { benchmark::DoNotOptimize(resultsByHand(texts).data()); },
+      [&] { benchmark::DoNotOptimize(platform.perform(one)); });
 }
-BENCHMARK(BM_ReadOne)->Arg(10)->Arg(100)->Arg(1'000)->UseRealTime();
 
-/// The same with every service a target.
-void BM_ReadAll(benchmark::State& state) {
-  BenchmarkPlatform platform(static_cast<std::size_t>(state.range(0)));
-  const Request request(nullptr, VAHAActionTypeGETValue, "POWER");
-  for (auto _ : state) benchmark::DoNotOptimize(platform.perform(request));
-  state.SetItemsProcessed(state.iterations() * state.range(0));
-}
-BENCHMARK(BM_ReadAll)->Arg(10)->Arg(100)->Arg(1'000)->UseRealTime();
+constexpr std::string_view kGet = VAHAActionTypeGETValue;
+constexpr std::string_view kSet = VAHAActionTypeSETValue;
+constexpr std::string_view kRaise = VAHAActionTypeINCREASEValue;
+
+BENCHMARK_CAPTURE(BM_CommandOne, 12, Kind::light, 12,
+                  Row{.name = "command, one target, names of 12", .goal = 1.3})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandOne, 24, Kind::light, 24,
+                  Row{.name = "command, one target, names of 24", .goal = 1.3})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, read_12, Kind::light, 12, kGet,
+                  Row{.name = "read all, names of 12", .goal = 4})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, read_24, Kind::light, 24, kGet,
+                  Row{.name = "read all, names of 24", .goal = 4})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, write_12, Kind::light, 12, kSet,
+                  Row{.name = "write all, names of 12", .goal = 4})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, write_24, Kind::light, 24, kSet,
+                  Row{.name = "write all, names of 24", .goal = 4})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, raise_12, Kind::light, 12, kRaise,
+                  Row{.name = "raise all, names of 12", .goal = 6})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, raise_24, Kind::light, 24, kRaise,
+                  Row{.name = "raise all, names of 24", .goal = 6})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandOne, embedded_24, Kind::embedded, 24,
+                  Row{.name = "command, one target, names of 24, embedded platform"})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, embedded_read_24, Kind::embedded, 24, kGet,
+                  Row{.name = "read all, names of 24, embedded platform"})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, embedded_write_24, Kind::embedded, 24, kSet,
+                  Row{.name = "write all, names of 24, embedded platform"})
+    ->Apply(everySize);
+BENCHMARK_CAPTURE(BM_CommandAll, embedded_raise_24, Kind::embedded, 24, kRaise,
+                  Row{.name = "raise all, names of 24, embedded platform"})
+    ->Apply(everySize);
 
 }  // namespace
 }  // namespace nidus

@@ -1,0 +1,47 @@
+#pragma once
+
+#include <benchmark/benchmark.h>
+
+#include <chrono>
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace nidus {
+
+using Work = std::function<void()>;
+
+/// How long the pieces of work of one row are repeated; a piece that takes longer by itself is run
+/// once.
+void setTimePerRow(std::chrono::milliseconds time);
+[[nodiscard]] std::chrono::milliseconds timePerRow();
+
+/// Runs the pieces of work in turn, again and again, and gives the least processor time that one
+/// run of each took on this thread, in nanoseconds. What disturbs the machine for a while disturbs
+/// all of them alike, and the least of many runs is the one that was disturbed least. Work that is
+/// short is run many times between two looks at the clock.
+[[nodiscard]] std::vector<double> leastNanoseconds(const std::vector<Work>& pieces);
+
+/// One line of the table.
+struct Row {
+  std::string name;
+  double ours = 0;
+  double floor = 0;
+  double goal = 0;  ///< The greatest ratio, or with `isLeast` the least; 0 is none.
+  bool isLeast = false;
+  bool isBytes = false;  ///< What is not bytes is nanoseconds.
+};
+
+/// Puts the row into the table, under the size `state.range(0)`.
+void report(benchmark::State& state, const Row& row);
+
+/// Measures `ours`, less what `deducted` takes unless that is empty, beside `floor`, and reports
+/// them. One more run of `ours` is timed by the benchmark library, which fits a growth to it.
+void measureRow(benchmark::State& state, Row row, const Work& ours, const Work& floor,
+                const Work& deducted = nullptr);
+
+/// Applies the sizes of all homes to a benchmark that measures by itself, and asks for its growth.
+void everySize(benchmark::internal::Benchmark* benchmark);
+void everySizeWithoutGrowth(benchmark::internal::Benchmark* benchmark);
+
+}  // namespace nidus
