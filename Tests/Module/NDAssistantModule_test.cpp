@@ -11,9 +11,9 @@
 #include <utility>
 #include <vector>
 
-#include "Module/ExportedSymbols.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/Assistant/VAHAFilter.h"
+#include "Support/ElfFile.h"
 #include "Support/FreshProcess.h"
 #include "Support/HomeBuilder.h"
 #include "Support/TestPlatform.h"
@@ -77,7 +77,7 @@ TEST(NDAssistantModuleTest, TellsItsVersions) {
 }
 
 TEST(NDAssistantModuleTest, ExportsItsEntryAndTheLogAlone) {
-  EXPECT_THAT(exportedSymbols(moduleFile()),
+  EXPECT_THAT(ElfFile(moduleFile()).exportedSymbols(),
               ElementsAre("NDAssistantModuleEntry", "WLOLog", "WLOLogV", "WLOShouldLogAtLevel",
                           "kWLOLogLevelKey"));
 }

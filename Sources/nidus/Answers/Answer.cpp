@@ -64,7 +64,8 @@ std::string commandText(const Order& order, const Replies& replies, const Vocabu
   for (std::size_t i = 0; i < forms.size(); ++i) {
     const std::string title =
         "Reply " + std::to_string(i + 1) + " of " + std::to_string(forms.size());
-    text += (i == 0 ? "" : "\n") + coloured(title, Colour::title, style) + '\n' +
+    if (i != 0) text += '\n';
+    text += coloured(title, Colour::title, style) + '\n' +
             replyText(order, forms[i], false, vocabulary, style);
   }
   return text;

@@ -8,6 +8,8 @@
 #include <csignal>
 #include <system_error>
 
+#include "nidus/Terminal/ProgramSearch.h"
+
 namespace nidus {
 namespace {
 
@@ -56,19 +58,26 @@ int waitForEnd(pid_t process) {
   return WIFEXITED(status) ? WEXITSTATUS(status) : kSignalled + WTERMSIG(status);
 }
 
+std::vector<char*> pointersTo(std::vector<std::string>& texts) {
+  std::vector<char*> pointers;
+  pointers.reserve(texts.size() + 1);
+  for (std::string& text : texts) pointers.push_back(text.data());
+  pointers.push_back(nullptr);
+  return pointers;
+}
+
 }  // namespace
 
 Result<int> runInForeground(std::vector<std::string> command) {
-  std::vector<char*> arguments;
-  arguments.reserve(command.size() + 1);
-  for (std::string& word : command) arguments.push_back(word.data());
-  arguments.push_back(nullptr);
+  const std::string folders = programFolders();
+  const std::string program = findProgram(command[0], folders);
+  std::vector<std::string> environment = environmentWith(folders);
   const IgnoredSignal interrupt(SIGINT);
   const IgnoredSignal quit(SIGQUIT);
   const UsualSignals signals;
   pid_t process = -1;
-  const int error = posix_spawnp(&process, arguments[0], nullptr, signals.attributes(),
-                                 arguments.data(), environ);
+  const int error = posix_spawn(&process, program.c_str(), nullptr, signals.attributes(),
+                                pointersTo(command).data(), pointersTo(environment).data());
   if (error != 0) {
     return Failure{Failure::Kind::platform, command[0] + ": cannot be started (" +
                                                 std::generic_category().message(error) +
