@@ -56,8 +56,8 @@ float moved(float current, const VAHAAction& action) {
 }
 
 /// The value within the limits; the minimum is compared with what the maximum has left.
-NDValueRef clamped(NDValueRef value,
-                   const std::shared_ptr<const NDCharacteristicMetadata>& limits) {
+NDValueRef clampedInOrder(NDValueRef value,
+                          const std::shared_ptr<const NDCharacteristicMetadata>& limits) {
   const NDValueRef& maximum = property(limits, &NDCharacteristicMetadata::maximumValue);
   const NDValueRef& minimum = property(limits, &NDCharacteristicMetadata::minimumValue);
   if (maximum && std::is_lt(maximum->compare(value))) value = maximum;
@@ -225,8 +225,8 @@ NDValueRef NDAssistantCommand::updateValue_forAction_outcome(
   const NDString writeType =
       property(metadata_, &NDNAPMetadata::mapWriteCharcteristicFromAssistantName, attribute);
   const auto target = characteristicOfType(characteristic->service(), writeType);
-  return clamped(adjustSetValue(updated, units, valueType, attribute),
-                 target ? target->metadata() : nullptr);
+  return clampedInOrder(adjustSetValue(updated, units, valueType, attribute),
+                        target ? target->metadata() : nullptr);
 }
 
 }  // namespace nidus

@@ -12,21 +12,21 @@ namespace {
 constexpr const char* kName = "faulty";
 
 /// What the calls of the file system have in common; plain data because the engine calls functions.
-struct State {
+struct DiskState {
   FaultyDisk::Fault fault;
   bool isArmed = false;
   std::int64_t calls = 0;
   bool hasFailed = false;
 };
 
-State& state() {
-  static State theState;
+DiskState& state() {
+  static DiskState theState;
   return theState;
 }
 
 /// Counts a call and says whether it is to fail.
 bool isToFail(bool writes) {
-  State& now = state();
+  DiskState& now = state();
   if (!now.isArmed) return false;
   if (now.fault.kind == FaultyDisk::Kind::full && !writes) return false;
   ++now.calls;
@@ -160,17 +160,17 @@ sqlite3_vfs& theDisk() {
 
 FaultyDisk::FaultyDisk() {
   if (!realDisk) realDisk = sqlite3_vfs_find(nullptr);
-  state() = State{};
+  state() = DiskState{};
   constexpr int kDefault = 1;
   sqlite3_vfs_register(&theDisk(), kDefault);
 }
 
 FaultyDisk::~FaultyDisk() {
-  state() = State{};
+  state() = DiskState{};
   sqlite3_vfs_unregister(&theDisk());
 }
 
-void FaultyDisk::arm(const Fault& fault) { state() = State{fault, true, 0, false}; }
+void FaultyDisk::arm(const Fault& fault) { state() = DiskState{fault, true, 0, false}; }
 
 bool FaultyDisk::disarm() {
   state().isArmed = false;

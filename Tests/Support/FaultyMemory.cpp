@@ -5,22 +5,23 @@
 namespace nidus {
 namespace {
 
-struct State {
+struct MemoryState {
   FaultyMemory::Fault fault;
   bool isArmed = false;
   std::int64_t allocations = 0;
   bool hasFailed = false;
 };
 
-State state;
+MemoryState memoryState;
 sqlite3_mem_methods realMemory;
 
 bool isToFail() {
-  if (!state.isArmed) return false;
-  ++state.allocations;
-  const bool fails = state.fault.lasts ? state.allocations >= state.fault.firstAllocation
-                                       : state.allocations == state.fault.firstAllocation;
-  state.hasFailed = state.hasFailed || fails;
+  if (!memoryState.isArmed) return false;
+  ++memoryState.allocations;
+  const bool fails = memoryState.fault.lasts
+                         ? memoryState.allocations >= memoryState.fault.firstAllocation
+                         : memoryState.allocations == memoryState.fault.firstAllocation;
+  memoryState.hasFailed = memoryState.hasFailed || fails;
   return fails;
 }
 
@@ -42,7 +43,7 @@ void useAllocator(sqlite3_mem_methods& methods, int lookasideBytes, int lookasid
 }  // namespace
 
 FaultyMemory::FaultyMemory() {
-  state = State{};
+  memoryState = MemoryState{};
   sqlite3_shutdown();
   sqlite3_config(SQLITE_CONFIG_GETMALLOC, &realMemory);
   sqlite3_mem_methods methods = realMemory;
@@ -52,17 +53,17 @@ FaultyMemory::FaultyMemory() {
 }
 
 FaultyMemory::~FaultyMemory() {
-  state = State{};
+  memoryState = MemoryState{};
   constexpr int kUsualBytes = 1200;
   constexpr int kUsualPieces = 40;
   useAllocator(realMemory, kUsualBytes, kUsualPieces);
 }
 
-void FaultyMemory::arm(const Fault& fault) { state = State{fault, true, 0, false}; }
+void FaultyMemory::arm(const Fault& fault) { memoryState = MemoryState{fault, true, 0, false}; }
 
 bool FaultyMemory::disarm() {
-  state.isArmed = false;
-  return state.hasFailed;
+  memoryState.isArmed = false;
+  return memoryState.hasFailed;
 }
 
 }  // namespace nidus

@@ -84,7 +84,7 @@ class LineReader {
 };
 
 /// `text` as it is typed where `quote` is open.
-std::string quoted(std::string_view text, char quote) {
+std::string typedWithin(std::string_view text, char quote) {
   std::string typed;
   for (const char c : text) {
     if (quote == '\'') {
@@ -132,9 +132,9 @@ UnfinishedLine unfinishedLineOf(std::string_view line) {
 std::string typedFormOf(const std::string& word, const UnfinishedLine& line) {
   const std::string& begun = line.words.back();
   if (word.compare(0, begun.size(), begun) == 0) {
-    return line.typed + quoted(std::string_view(word).substr(begun.size()), line.quote);
+    return line.typed + typedWithin(std::string_view(word).substr(begun.size()), line.quote);
   }
-  return std::string(line.quote == 0 ? 0 : 1, line.quote) + quoted(word, line.quote);
+  return std::string(line.quote == 0 ? 0 : 1, line.quote) + typedWithin(word, line.quote);
 }
 
 }  // namespace nidus

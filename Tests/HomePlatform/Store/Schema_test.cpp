@@ -7,7 +7,7 @@
 namespace nidus {
 namespace {
 
-constexpr std::chrono::milliseconds kNoWaiting{0};
+constexpr std::chrono::milliseconds kNoTimeout{0};
 
 std::vector<std::string> steps(std::size_t count) {
   const std::vector<std::string> all = {
@@ -21,7 +21,7 @@ std::vector<std::string> steps(std::size_t count) {
 std::int64_t version(Database& database) { return database.number("PRAGMA user_version"); }
 
 TEST(ApplySchemaTest, RunsAllStepsOnANewDatabase) {
-  Database database(Database::kInMemory, kNoWaiting);
+  Database database(Database::kInMemory, kNoTimeout);
   EXPECT_FALSE(applySchema(database, steps(3)));
   EXPECT_EQ(version(database), 3);
   EXPECT_EQ(database.number("PRAGMA application_id"), kSchemaApplicationID);
@@ -30,7 +30,7 @@ TEST(ApplySchemaTest, RunsAllStepsOnANewDatabase) {
 
 TEST(ApplySchemaTest, MigratesEachEarlierVersion) {
   for (std::size_t earlier = 1; earlier <= 3; ++earlier) {
-    Database database(Database::kInMemory, kNoWaiting);
+    Database database(Database::kInMemory, kNoTimeout);
     ASSERT_FALSE(applySchema(database, steps(earlier)));
     EXPECT_EQ(version(database), static_cast<std::int64_t>(earlier));
     EXPECT_FALSE(applySchema(database, steps(3)));
@@ -40,21 +40,21 @@ TEST(ApplySchemaTest, MigratesEachEarlierVersion) {
 }
 
 TEST(ApplySchemaTest, LeavesNewerVersionsAlone) {
-  Database database(Database::kInMemory, kNoWaiting);
+  Database database(Database::kInMemory, kNoTimeout);
   ASSERT_FALSE(applySchema(database, steps(3)));
   EXPECT_EQ(applySchema(database, steps(2)), SchemaProblem::newer);
   EXPECT_EQ(version(database), 3);
 }
 
 TEST(ApplySchemaTest, LeavesForeignDatabasesAlone) {
-  Database database(Database::kInMemory, kNoWaiting);
+  Database database(Database::kInMemory, kNoTimeout);
   database.run("CREATE TABLE recipe (name TEXT); PRAGMA user_version = 1");
   EXPECT_EQ(applySchema(database, steps(1)), SchemaProblem::notOurs);
   EXPECT_EQ(database.number("PRAGMA application_id"), 0);
 }
 
 TEST(ApplySchemaTest, UndoesAMigrationThatFails) {
-  Database database(Database::kInMemory, kNoWaiting);
+  Database database(Database::kInMemory, kNoTimeout);
   ASSERT_FALSE(applySchema(database, steps(1)));
   std::vector<std::string> broken = steps(2);
   broken.emplace_back("INSERT INTO missing VALUES (1)");
@@ -64,14 +64,14 @@ TEST(ApplySchemaTest, UndoesAMigrationThatFails) {
 }
 
 TEST(SchemaStepsTest, LeadToTheTablesOfToday) {
-  Database database(Database::kInMemory, kNoWaiting);
+  Database database(Database::kInMemory, kNoTimeout);
   ASSERT_FALSE(applySchema(database, schemaSteps()));
   EXPECT_EQ(database.number("SELECT count(*) FROM sqlite_schema WHERE type = 'table'"), 12);
   EXPECT_EQ(version(database), static_cast<std::int64_t>(schemaSteps().size()));
 }
 
 TEST(SchemaStepsTest, IndexEveryReference) {
-  Database database(Database::kInMemory, kNoWaiting);
+  Database database(Database::kInMemory, kNoTimeout);
   ASSERT_FALSE(applySchema(database, schemaSteps()));
   Statement references(database,
                        "SELECT t.name, f.\"from\" FROM sqlite_schema AS t, "

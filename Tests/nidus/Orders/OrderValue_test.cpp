@@ -12,7 +12,7 @@ struct ValueCase {
   std::string expected;
 };
 
-void expectActions(const std::vector<ValueCase>& cases, bool isMetric = true) {
+void expectValues(const std::vector<ValueCase>& cases, bool isMetric = true) {
   for (const ValueCase& tried : cases) {
     SCOPED_TRACE(tried.line);
     EXPECT_EQ(actionsOf(tried.line, isMetric), tried.expected);
@@ -20,7 +20,7 @@ void expectActions(const std::vector<ValueCase>& cases, bool isMetric = true) {
 }
 
 TEST(OrderValueTest, ReadsWordsForYesAndNo) {
-  expectActions({
+  expectValues({
       {"set power on", "SET POWER boolean 1"},
       {"set power OFF", "SET POWER boolean 0"},
       {"set power yes", "SET POWER boolean 1"},
@@ -39,7 +39,7 @@ TEST(OrderValueTest, ReadsWordsForYesAndNo) {
 }
 
 TEST(OrderValueTest, ReadsNumbersInTheClassOfTheAttribute) {
-  expectActions({
+  expectValues({
       {"set brightness 40", "SET BRIGHTNESS 40"},
       {"set brightness +40", "SET BRIGHTNESS 40"},
       {"set brightness -5", "SET BRIGHTNESS -5"},
@@ -53,7 +53,7 @@ TEST(OrderValueTest, ReadsNumbersInTheClassOfTheAttribute) {
 }
 
 TEST(OrderValueTest, TakesTheUnitOfTheAttribute) {
-  expectActions({
+  expectValues({
       {"set brightness 40%", "SET BRIGHTNESS 40"},
       {"set brightness 40 %", "SET BRIGHTNESS 40"},
       {"set brightness 40 percent", "SET BRIGHTNESS 40"},
@@ -66,7 +66,7 @@ TEST(OrderValueTest, TakesTheUnitOfTheAttribute) {
 }
 
 TEST(OrderValueTest, ReadsTheWordsOfTheAttribute) {
-  expectActions({
+  expectValues({
       {"set climate_mode heat", "SET CLIMATE_MODE text HEAT"},
       {"set climate_mode OFF", "SET CLIMATE_MODE text OFF"},
       {"get security_mode is Away", "GET SECURITY_MODE text AWAY"},
@@ -78,7 +78,7 @@ TEST(OrderValueTest, ReadsTheWordsOfTheAttribute) {
 TEST(OrderValueTest, RefusesWhatTheAttributeDoesNotTake) {
   const std::string wholeNumber = ": BRIGHTNESS takes a whole number, such as 40 or 40%";
   const std::string temperature = ": TEMPERATURE takes a temperature, such as 21.5C, 70F or 21.5";
-  expectActions({
+  expectValues({
       {"set brightness blue", "blue" + wholeNumber},
       {"set brightness on", "on" + wholeNumber},
       {"set brightness 40.5", "40.5" + wholeNumber},
@@ -114,48 +114,48 @@ TEST(OrderValueTest, SendsATemperatureWithAUnitInCelsius) {
       {"set heating_threshold 68F", "SET HEATING_THRESHOLD float 20 CELSIUS"},
       {"set cooling_threshold 26C", "SET COOLING_THRESHOLD float 26 CELSIUS"},
   };
-  expectActions(cases, true);
-  expectActions(cases, false);
+  expectValues(cases, true);
+  expectValues(cases, false);
 }
 
 TEST(OrderValueTest, SendsADifferenceInTheUnitOfTheDevice) {
-  expectActions({{"raise temperature 5F", "INCREASE TEMPERATURE float 2.7777777"},
-                 {"lower temperature 2C", "DECREASE TEMPERATURE float 2"},
-                 {"raise heating_threshold 9F", "INCREASE HEATING_THRESHOLD float 5"}},
-                true);
-  expectActions({{"raise temperature 5F", "INCREASE TEMPERATURE float 5"},
-                 {"lower temperature 2C", "DECREASE TEMPERATURE float 3.6"}},
-                false);
+  expectValues({{"raise temperature 5F", "INCREASE TEMPERATURE float 2.7777777"},
+                {"lower temperature 2C", "DECREASE TEMPERATURE float 2"},
+                {"raise heating_threshold 9F", "INCREASE HEATING_THRESHOLD float 5"}},
+               true);
+  expectValues({{"raise temperature 5F", "INCREASE TEMPERATURE float 5"},
+                {"lower temperature 2C", "DECREASE TEMPERATURE float 3.6"}},
+               false);
 }
 
 TEST(OrderValueTest, AsksInTheUnitOfThePerson) {
   for (const bool isMetric : {true, false}) {
-    expectActions({{"get temperature is 70F", "GET TEMPERATURE float 70 FAHRENHEIT"},
-                   {"get temperature is 21.5C", "GET TEMPERATURE float 21.5 CELSIUS"},
-                   {"get temperature is 70", "GET TEMPERATURE float 70"}},
-                  isMetric);
+    expectValues({{"get temperature is 70F", "GET TEMPERATURE float 70 FAHRENHEIT"},
+                  {"get temperature is 21.5C", "GET TEMPERATURE float 21.5 CELSIUS"},
+                  {"get temperature is 70", "GET TEMPERATURE float 70"}},
+                 isMetric);
   }
 }
 
 TEST(OrderValueTest, SendsATemperatureWithoutAUnitAsItIs) {
   for (const bool isMetric : {true, false}) {
-    expectActions({{"set temperature 20", "SET TEMPERATURE float 20"},
-                   {"raise temperature 3", "INCREASE TEMPERATURE float 3"},
-                   {"lower temperature", "DECREASE TEMPERATURE"}},
-                  isMetric);
+    expectValues({{"set temperature 20", "SET TEMPERATURE float 20"},
+                  {"raise temperature 3", "INCREASE TEMPERATURE float 3"},
+                  {"lower temperature", "DECREASE TEMPERATURE"}},
+                 isMetric);
   }
 }
 
 TEST(OrderValueTest, SendsThresholdsSoThatFahrenheitIsUnderstood) {
-  expectActions({{"set heating_threshold 20", "SET HEATING_THRESHOLD float 20"},
-                 {"raise heating_threshold", "INCREASE HEATING_THRESHOLD"}},
-                true);
-  expectActions({{"set heating_threshold 68", "SET HEATING_THRESHOLD float 20 CELSIUS"},
-                 {"raise heating_threshold 9F", "INCREASE HEATING_THRESHOLD float 5 CELSIUS"},
-                 {"lower heating_threshold 9", "DECREASE HEATING_THRESHOLD float 5 CELSIUS"},
-                 {"raise heating_threshold", "INCREASE HEATING_THRESHOLD float 2.7777777 CELSIUS"},
-                 {"get heating_threshold is 68", "GET HEATING_THRESHOLD float 68"}},
-                false);
+  expectValues({{"set heating_threshold 20", "SET HEATING_THRESHOLD float 20"},
+                {"raise heating_threshold", "INCREASE HEATING_THRESHOLD"}},
+               true);
+  expectValues({{"set heating_threshold 68", "SET HEATING_THRESHOLD float 20 CELSIUS"},
+                {"raise heating_threshold 9F", "INCREASE HEATING_THRESHOLD float 5 CELSIUS"},
+                {"lower heating_threshold 9", "DECREASE HEATING_THRESHOLD float 5 CELSIUS"},
+                {"raise heating_threshold", "INCREASE HEATING_THRESHOLD float 2.7777777 CELSIUS"},
+                {"get heating_threshold is 68", "GET HEATING_THRESHOLD float 68"}},
+               false);
 }
 
 /// Attributes of a kind that the built-in vocabulary does not have.
@@ -178,7 +178,7 @@ class OwnVocabularyTest : public ::testing::Test {
     entry.unit = unit;
     vocabulary_.characteristics.push_back(entry);
   }
-  void expectActions(const std::vector<ValueCase>& cases) const {
+  void expectValues(const std::vector<ValueCase>& cases) const {
     for (const ValueCase& tried : cases) {
       SCOPED_TRACE(tried.line);
       EXPECT_EQ(actionsOf(tried.line, vocabulary_), tried.expected);
@@ -189,7 +189,7 @@ class OwnVocabularyTest : public ::testing::Test {
 };
 
 TEST_F(OwnVocabularyTest, TakesAnyText) {
-  expectActions({
+  expectValues({
       {"set note Back at noon", "SET NOTE text Back at noon"},
       {"set note maximum", "SET NOTE text maximum"},
       {"get note is 40%", "GET NOTE text 40%"},
@@ -197,7 +197,7 @@ TEST_F(OwnVocabularyTest, TakesAnyText) {
 }
 
 TEST_F(OwnVocabularyTest, KeepsWholeNumbersInTheirRange) {
-  expectActions({
+  expectValues({
       {"set LEVEL 255", "SET level 255"},
       {"set Level 256", "256: level takes a whole number, such as 40"},
       {"set level -1", "-1: level takes a whole number, such as 40"},
@@ -207,14 +207,14 @@ TEST_F(OwnVocabularyTest, KeepsWholeNumbersInTheirRange) {
 }
 
 TEST_F(OwnVocabularyTest, RefusesValuesThatAreNoWords) {
-  expectActions({
+  expectValues({
       {"get data", "GET DATA"},
       {"set data 1", "1: values of DATA can not be written in words; use nidus perform"},
   });
 }
 
 TEST_F(OwnVocabularyTest, ConvertsToAUnitThatDoesNotFollowTheDevice) {
-  expectActions({
+  expectValues({
       {"set oven 100C", "SET OVEN float 212 FAHRENHEIT"},
       {"set oven 350F", "SET OVEN float 350 FAHRENHEIT"},
       {"set oven 350", "SET OVEN float 350"},
