@@ -1,6 +1,9 @@
 #include "Load/LoadHome.h"
 
+#include <algorithm>
+#include <initializer_list>
 #include <string>
+#include <string_view>
 #include <utility>
 
 namespace nidus {
@@ -10,27 +13,48 @@ constexpr std::uint8_t kHomeKind = 1;
 constexpr std::uint8_t kRoomKind = 2;
 constexpr std::uint8_t kLampKind = 3;
 constexpr std::uint8_t kSceneKind = 4;
+constexpr std::uint8_t kGroupKind = 5;
+constexpr std::uint8_t kZoneKind = 6;
+constexpr std::size_t kReadOnlyLamp = kLampsPerRoom - 1;
 constexpr std::size_t kLockedLamp = kLampsPerRoom;
 constexpr std::size_t kUnreachableLamp = kLampsPerRoom + 1;
 constexpr std::size_t kAllLamps = kLampsPerRoom + 2;
+constexpr std::int64_t kLight = 8;
+constexpr std::int64_t kPower = 9;
+constexpr std::int64_t kBrightness = 10;
+constexpr std::string_view kRenamed = " bis";
 
-NDUUID makeUUID(std::uint8_t kind, std::size_t room, std::size_t lamp = 0) {
+NDUUID makeUUID(std::uint8_t kind, std::size_t home, std::size_t room = 0, std::size_t lamp = 0) {
   std::array<std::uint8_t, 16> bytes{};
   bytes[0] = kind;
-  bytes[1] = static_cast<std::uint8_t>(room);
-  bytes[2] = static_cast<std::uint8_t>(lamp);
+  bytes[1] = static_cast<std::uint8_t>(home);
+  bytes[2] = static_cast<std::uint8_t>(room);
+  bytes[3] = static_cast<std::uint8_t>(lamp);
   return NDUUID(bytes);
 }
 
-NDString numbered(const char* word, std::size_t number) {
-  return std::string(word) + " " + std::to_string(number);
+/// Such as "Lamp 0.3.1"; no such name is the beginning of another.
+NDString numbered(std::string_view word, std::initializer_list<std::size_t> numbers) {
+  std::string name(word);
+  char separator = ' ';
+  for (const std::size_t number : numbers) {
+    name += std::exchange(separator, '.') + std::to_string(number);
+  }
+  return name;
 }
 
-CharacteristicData power() {
+std::string_view firstNameOf(const NDString& name) {
+  std::string_view text = name.view();
+  if (text.ends_with(kRenamed)) text.remove_suffix(kRenamed.size());
+  return text;
+}
+
+CharacteristicData power(bool isReadOnly) {
   CharacteristicData power;
-  power.instanceID = 9;
+  power.instanceID = kPower;
   power.characteristicType = "com.corvane.nidus.characteristic.power";
-  power.properties = {"readable", "writable"};
+  power.properties = {"readable"};
+  if (!isReadOnly) power.properties.emplace_back("writable");
   power.value = power.deviceValue = NDValue::boolean(false);
   power.metadata.emplace().format = "bool";
   return power;
@@ -38,7 +62,7 @@ CharacteristicData power() {
 
 CharacteristicData brightness() {
   CharacteristicData brightness;
-  brightness.instanceID = 10;
+  brightness.instanceID = kBrightness;
   brightness.characteristicType = "com.corvane.nidus.characteristic.brightness";
   brightness.properties = {"readable", "writable"};
   brightness.value = brightness.deviceValue = NDValue::integer(40);
@@ -50,57 +74,119 @@ CharacteristicData brightness() {
   return brightness;
 }
 
-AccessoryData lamp(std::size_t room, std::size_t number) {
-  ServiceData light;
-  light.instanceID = 8;
-  light.name = lampName(room, number);
-  light.serviceType = "com.corvane.nidus.service.light";
-  light.characteristics = {power(), brightness()};
-  AccessoryData lamp;
-  lamp.uuid = makeUUID(kLampKind, room, number);
-  lamp.name = light.name;
-  lamp.room = makeUUID(kRoomKind, room);
-  lamp.requiresUnlock = number == kLockedLamp;
-  lamp.reachable = number != kUnreachableLamp;
-  lamp.services = {std::move(light)};
-  return lamp;
-}
+/// Puts one home together; with `random` some things are renamed and others left out.
+class HomeMaking {
+ public:
+  HomeMaking(std::size_t home, std::size_t rooms, Random* random)
+      : number_(home), rooms_(rooms), random_(random) {}
 
-ActionSetData scene(std::size_t room) {
-  ActionSetData scene;
-  scene.uuid = makeUUID(kSceneKind, room);
-  scene.name = sceneName(room);
-  scene.actions = {
-      {.target = {.accessory = makeUUID(kLampKind, room, 0), .service = 8, .characteristic = 9},
-       .value = NDValue::boolean(true)}};
-  return scene;
-}
+  HomeData make() {
+    home_.uuid = makeUUID(kHomeKind, number_);
+    home_.name = named(homeName(number_));
+    home_.primary = number_ == 0;
+    home_.serviceGroups = {{makeUUID(kGroupKind, number_), groupName(number_), {}}};
+    home_.zones = {{makeUUID(kZoneKind, number_), numbered("Zone", {number_}), {}}};
+    for (std::size_t room = 0; room < rooms_; ++room) addRoom(room);
+    return std::move(home_);
+  }
+
+ private:
+  [[nodiscard]] bool isOne(std::size_t count) { return random_ && random_->oneIn(count); }
+  [[nodiscard]] NDString named(NDString name) { return isOne(8) ? renamed(name) : name; }
+
+  void addRoom(std::size_t room) {
+    std::optional<NDUUID> uuid;
+    if (!isOne(8)) {
+      uuid = makeUUID(kRoomKind, number_, room);
+      home_.rooms.push_back({.uuid = *uuid, .name = named(roomName(number_, room))});
+      home_.zones.front().rooms.push_back(*uuid);
+    }
+    for (std::size_t lamp = 0; lamp < kAllLamps; ++lamp) {
+      if (!isOne(6)) addLamp(room, lamp, uuid);
+    }
+    if (!isOne(4)) addScene(room);
+  }
+
+  void addLamp(std::size_t room, std::size_t number, const std::optional<NDUUID>& stands) {
+    ServiceData light;
+    light.instanceID = kLight;
+    light.name = named(lampName(number_, room, number));
+    light.serviceType = "com.corvane.nidus.service.light";
+    light.characteristics = {power(number == kReadOnlyLamp), brightness()};
+    AccessoryData lamp;
+    lamp.uuid = makeUUID(kLampKind, number_, room, number);
+    lamp.name = light.name;
+    lamp.room = stands;
+    lamp.requiresUnlock = number == kLockedLamp;
+    lamp.reachable = number != kUnreachableLamp;
+    lamp.services = {std::move(light)};
+    if (number == 0) home_.serviceGroups.front().services.push_back({lamp.uuid, kLight});
+    home_.accessories.push_back(std::move(lamp));
+  }
+
+  void addScene(std::size_t room) {
+    ActionSetData scene;
+    scene.uuid = makeUUID(kSceneKind, number_, room);
+    scene.name = named(sceneName(number_, room));
+    const CharacteristicAddress target = powerOf(number_, room, 0);
+    const auto& lamps = home_.accessories;
+    const bool hasTarget = std::any_of(lamps.begin(), lamps.end(), [&target](const auto& lamp) {
+      return lamp.uuid == target.accessory;
+    });
+    if (hasTarget) scene.actions = {{.target = target, .value = NDValue::boolean(true)}};
+    home_.actionSets.push_back(std::move(scene));
+  }
+
+  const std::size_t number_;
+  const std::size_t rooms_;
+  Random* const random_;
+  HomeData home_;
+};
 
 }  // namespace
 
-NDString roomName(std::size_t room) { return numbered("Room", room); }
-NDString lampName(std::size_t room, std::size_t lamp) {
-  return numbered("Lamp", room * kAllLamps + lamp);
-}
-NDString lockedLampName(std::size_t room) { return lampName(room, kLockedLamp); }
-NDString unreachableLampName(std::size_t room) { return lampName(room, kUnreachableLamp); }
-NDString sceneName(std::size_t room) { return numbered("Scene", room); }
-
-std::vector<HomeData> loadHomes(std::size_t rooms) {
-  HomeData home;
-  home.uuid = makeUUID(kHomeKind, 0);
-  home.name = "Load";
-  home.primary = true;
-  for (std::size_t room = 0; room < rooms; ++room) {
-    home.rooms.push_back({.uuid = makeUUID(kRoomKind, room), .name = roomName(room)});
-    for (std::size_t number = 0; number < kAllLamps; ++number) {
-      home.accessories.push_back(lamp(room, number));
-    }
-    home.actionSets.push_back(scene(room));
-  }
-  return {std::move(home)};
+HomeData loadHome(std::size_t home, std::size_t rooms) {
+  return HomeMaking(home, rooms, nullptr).make();
 }
 
-std::size_t entityCount(std::size_t rooms) { return 1 + rooms * (kAllLamps + 2); }
+HomeData changedHome(std::size_t home, std::size_t rooms, Random& random) {
+  return HomeMaking(home, rooms, &random).make();
+}
+
+std::size_t entityCount(std::size_t rooms) { return 3 + rooms * (kAllLamps + 2); }
+
+NDString homeName(std::size_t home) { return numbered("Home", {home}); }
+NDString roomName(std::size_t home, std::size_t room) { return numbered("Room", {home, room}); }
+NDString lampName(std::size_t home, std::size_t room, std::size_t lamp) {
+  return numbered("Lamp", {home, room, lamp});
+}
+NDString lockedLampName(std::size_t home, std::size_t room) {
+  return lampName(home, room, kLockedLamp);
+}
+NDString unreachableLampName(std::size_t home, std::size_t room) {
+  return lampName(home, room, kUnreachableLamp);
+}
+NDString sceneName(std::size_t home, std::size_t room) { return numbered("Scene", {home, room}); }
+NDString groupName(std::size_t home) { return numbered("Group", {home}); }
+
+NDString renamed(const NDString& name) { return name.str().append(kRenamed); }
+
+bool isSameObject(const NDString& a, const NDString& b) {
+  return a && b && firstNameOf(a) == firstNameOf(b);
+}
+
+bool isInGroup(const NDString& lamp, const NDString& group) {
+  const std::string_view home = firstNameOf(group).substr(std::string_view("Group ").size());
+  const std::string_view name = firstNameOf(lamp);
+  return name.starts_with("Lamp " + std::string(home) + ".") && name.ends_with(".0");
+}
+
+CharacteristicAddress powerOf(std::size_t home, std::size_t room, std::size_t lamp) {
+  return {makeUUID(kLampKind, home, room, lamp), kLight, kPower};
+}
+
+CharacteristicAddress brightnessOf(std::size_t home, std::size_t room, std::size_t lamp) {
+  return {makeUUID(kLampKind, home, room, lamp), kLight, kBrightness};
+}
 
 }  // namespace nidus

@@ -2,6 +2,7 @@
 
 #include <stdexcept>
 #include <string>
+#include <utility>
 
 #include "Support/TestTypes.h"
 #include "Support/TestUUID.h"
@@ -25,12 +26,22 @@ Pointer required(Pointer object, const NDString& name) {
 }  // namespace
 
 HomeBuilder::HomeBuilder(const NDString& name)
-    : home_(std::make_shared<TestHome>(testUUID(0, numberOf(name)), name, false)),
-      room_(std::make_shared<TestRoom>(nextUUID(), name, home_)) {
+    : HomeBuilder(std::make_shared<TestHome>(testUUID(0, numberOf(name)), name, false)) {}
+
+HomeBuilder::HomeBuilder(std::shared_ptr<TestHome> home)
+    : home_(std::move(home)), room_(std::make_shared<TestRoom>(nextUUID(), home_->name(), home_)) {
   home_->defaultRoom_ = room_;
 }
 
-NDUUID HomeBuilder::nextUUID() { return testUUID(++objectCount_, numberOf(home_->name())); }
+NDUUID HomeBuilder::nextUUID() {
+  const NDUUID counted = testUUID(++objectCount_, numberOf(home_->name()));
+  return std::exchange(givenUUID_, std::nullopt).value_or(counted);
+}
+
+HomeBuilder& HomeBuilder::uuid(const NDUUID& uuid) {
+  givenUUID_ = uuid;
+  return *this;
+}
 
 HomeBuilder& HomeBuilder::primary() {
   home_->isPrimary_ = true;

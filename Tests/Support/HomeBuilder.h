@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <vector>
 
 #include "Support/CharacteristicSpec.h"
@@ -21,8 +22,12 @@ class HomeBuilder {
   using Names = std::vector<NDString>;
 
   explicit HomeBuilder(const NDString& name);
+  /// Furnishes `home` (never null), which the test has made and in which there is nothing yet.
+  explicit HomeBuilder(std::shared_ptr<TestHome> home);
 
   HomeBuilder& primary();
+  /// The object that is added next has that UUID.
+  HomeBuilder& uuid(const NDUUID& uuid);
   /// Adds a room; the accessories that follow stand in it.
   HomeBuilder& room(const NDString& name);
   /// The accessories that follow stand in the first room of that name, which must be there.
@@ -54,6 +59,7 @@ class HomeBuilder {
 
   // First, because making the default room counts already.
   std::uint32_t objectCount_ = 0;
+  std::optional<NDUUID> givenUUID_;
   std::int64_t characteristicCount_ = 0;
   std::shared_ptr<TestHome> home_;
   std::shared_ptr<NDRoom> room_;

@@ -19,7 +19,7 @@ namespace nidus {
 ///
 /// An answer comes through the registered platform's shared queue unless the test chooses another
 /// queue or holds answers back.
-class TestHome final : public NDHome {
+class TestHome : public NDHome {
  public:
   using Reads = NDArray<NDCharacteristic>;
   using Writes = std::vector<NDCharacteristicWriteRequestTuple>;
