@@ -6,6 +6,7 @@
 #include <stdexcept>
 #include <utility>
 
+#include "HomePlatform/System/DataFolder.h"
 #include "Load/LoadHome.h"
 #include "Load/Performance.h"
 #include "Support/StandingClock.h"
@@ -23,7 +24,7 @@ constexpr std::chrono::minutes kLongestCommand(5);
 
 EmbeddedStage::EmbeddedStage(StressRecord& record, std::size_t callers)
     : record_(record), callers_(callers), platform_(open()), other_(open()) {
-  auto store = HomeStore::open(folder_.path() / "homes.db");
+  auto store = HomeStore::open(folder_.path() / kDatabaseFile);
   if (!store) throw std::runtime_error(store.failure().message);
   store_ = std::move(*store);
   std::vector<HomeData> homes = {loadHome(0, callers)};
