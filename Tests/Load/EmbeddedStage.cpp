@@ -14,8 +14,6 @@
 namespace nidus {
 namespace {
 
-constexpr std::size_t kHomes = 3;
-constexpr std::size_t kRooms = 3;
 constexpr std::size_t kPending = 20;
 /// Longer than any command takes on the slowest machine, so that a lost one is told of.
 constexpr std::chrono::minutes kLongestCommand(5);
@@ -28,7 +26,7 @@ EmbeddedStage::EmbeddedStage(StressRecord& record, std::size_t callers)
   if (!store) throw std::runtime_error(store.failure().message);
   store_ = std::move(*store);
   std::vector<HomeData> homes = {loadHome(0, callers)};
-  for (std::size_t home = 1; home < kHomes; ++home) homes.push_back(loadHome(home, kRooms));
+  for (std::size_t home = 1; home < kLoadHomes; ++home) homes.push_back(loadHome(home, kLoadRooms));
   expectDone(platform_->importHomes(homes, false), "the first import");
   record_.expect(NDPlatform::registerPlatform(platform_).empty(), "a platform is registered",
                  "the begin");
@@ -71,7 +69,7 @@ void EmbeddedStage::command(std::size_t caller, Random& random) {
   if (random.oneIn(2)) {
     ownRooms_.at(caller).step();
   } else {
-    static_cast<void>(performToEnd(CommandMix{.homes = {1, 2}, .rooms = kRooms}.draw(random)));
+    static_cast<void>(performToEnd(CommandMix{.homes = {1, 2}, .rooms = kLoadRooms}.draw(random)));
   }
 }
 
@@ -104,8 +102,8 @@ void EmbeddedStage::sync(std::size_t /*caller*/, Random& /*random*/) {
 
 void EmbeddedStage::change(std::size_t /*caller*/, Random& random) {
   HomePlatform& platform = random.oneIn(2) ? *platform_ : *other_;
-  const std::size_t number = 1 + random.below(kHomes - 1);
-  HomeData changed = changedHome(number, kRooms, random);
+  const std::size_t number = 1 + random.below(kLoadHomes - 1);
+  HomeData changed = changedHome(number, kLoadRooms, random);
   changed.primary = false;
   const auto isSame = [&changed](const HomeData& home) { return home.uuid == changed.uuid; };
   switch (random.below(8)) {
@@ -144,8 +142,8 @@ void EmbeddedStage::change(std::size_t /*caller*/, Random& random) {
 /// Puts other homes in the place of all; what callers have written is taken back.
 void EmbeddedStage::importAll(HomePlatform& platform, Random& random) {
   std::vector<HomeData> homes = {loadHome(0, callers_)};
-  for (std::size_t home = 1; home < kHomes; ++home) {
-    homes.push_back(changedHome(home, kRooms, random));
+  for (std::size_t home = 1; home < kLoadHomes; ++home) {
+    homes.push_back(changedHome(home, kLoadRooms, random));
   }
   ++importsBegun_;
   expectDone(platform.importHomes(homes, false), "an import");
@@ -154,8 +152,8 @@ void EmbeddedStage::importAll(HomePlatform& platform, Random& random) {
 
 /// What another process does that writes values.
 void EmbeddedStage::writeValues(Random& random) {
-  const std::size_t home = 1 + random.below(kHomes - 1);
-  const std::size_t room = random.below(kRooms);
+  const std::size_t home = 1 + random.below(kLoadHomes - 1);
+  const std::size_t room = random.below(kLoadRooms);
   const std::size_t lamp = random.below(kLampsPerRoom);
   const NDValueRef level = NDValue::integer(static_cast<std::int64_t>(random.below(100)));
   expectDone(

@@ -19,9 +19,9 @@ constexpr std::size_t kReadOnlyLamp = kLampsPerRoom - 1;
 constexpr std::size_t kLockedLamp = kLampsPerRoom;
 constexpr std::size_t kUnreachableLamp = kLampsPerRoom + 1;
 constexpr std::size_t kAllLamps = kLampsPerRoom + 2;
-constexpr std::int64_t kLight = 8;
-constexpr std::int64_t kPower = 9;
-constexpr std::int64_t kBrightness = 10;
+constexpr std::int64_t kLightID = 8;
+constexpr std::int64_t kPowerID = 9;
+constexpr std::int64_t kBrightnessID = 10;
 constexpr std::string_view kRenamed = " bis";
 
 NDUUID makeUUID(std::uint8_t kind, std::size_t home, std::size_t room = 0, std::size_t lamp = 0) {
@@ -49,9 +49,9 @@ std::string_view firstNameOf(const NDString& name) {
   return text;
 }
 
-CharacteristicData power(bool isReadOnly) {
+CharacteristicData lampPower(bool isReadOnly) {
   CharacteristicData power;
-  power.instanceID = kPower;
+  power.instanceID = kPowerID;
   power.characteristicType = "com.corvane.nidus.characteristic.power";
   power.properties = {"readable"};
   if (!isReadOnly) power.properties.emplace_back("writable");
@@ -60,9 +60,9 @@ CharacteristicData power(bool isReadOnly) {
   return power;
 }
 
-CharacteristicData brightness() {
+CharacteristicData lampBrightness() {
   CharacteristicData brightness;
-  brightness.instanceID = kBrightness;
+  brightness.instanceID = kBrightnessID;
   brightness.characteristicType = "com.corvane.nidus.characteristic.brightness";
   brightness.properties = {"readable", "writable"};
   brightness.value = brightness.deviceValue = NDValue::integer(40);
@@ -109,10 +109,10 @@ class HomeMaking {
 
   void addLamp(std::size_t room, std::size_t number, const std::optional<NDUUID>& stands) {
     ServiceData light;
-    light.instanceID = kLight;
+    light.instanceID = kLightID;
     light.name = named(lampName(number_, room, number));
     light.serviceType = "com.corvane.nidus.service.light";
-    light.characteristics = {power(number == kReadOnlyLamp), brightness()};
+    light.characteristics = {lampPower(number == kReadOnlyLamp), lampBrightness()};
     AccessoryData lamp;
     lamp.uuid = makeUUID(kLampKind, number_, room, number);
     lamp.name = light.name;
@@ -120,7 +120,7 @@ class HomeMaking {
     lamp.requiresUnlock = number == kLockedLamp;
     lamp.reachable = number != kUnreachableLamp;
     lamp.services = {std::move(light)};
-    if (number == 0) home_.serviceGroups.front().services.push_back({lamp.uuid, kLight});
+    if (number == 0) home_.serviceGroups.front().services.push_back({lamp.uuid, kLightID});
     home_.accessories.push_back(std::move(lamp));
   }
 
@@ -182,11 +182,11 @@ bool isInGroup(const NDString& lamp, const NDString& group) {
 }
 
 CharacteristicAddress powerOf(std::size_t home, std::size_t room, std::size_t lamp) {
-  return {makeUUID(kLampKind, home, room, lamp), kLight, kPower};
+  return {makeUUID(kLampKind, home, room, lamp), kLightID, kPowerID};
 }
 
 CharacteristicAddress brightnessOf(std::size_t home, std::size_t room, std::size_t lamp) {
-  return {makeUUID(kLampKind, home, room, lamp), kLight, kBrightness};
+  return {makeUUID(kLampKind, home, room, lamp), kLightID, kBrightnessID};
 }
 
 }  // namespace nidus

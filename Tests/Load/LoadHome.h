@@ -12,6 +12,9 @@ namespace nidus {
 /// which the last cannot be switched, a lamp that is locked and one that cannot be reached, and it
 /// has a scene; a group holds the first lamp of each room, a zone all rooms.
 inline constexpr std::size_t kLampsPerRoom = 3;
+/// How many homes there are, and how many rooms those have that change.
+inline constexpr std::size_t kLoadHomes = 3;
+inline constexpr std::size_t kLoadRooms = 3;
 
 /// The home as it is when nobody has changed it; number 0 is the primary one.
 [[nodiscard]] HomeData loadHome(std::size_t home, std::size_t rooms);

@@ -11,8 +11,6 @@
 namespace nidus {
 namespace {
 
-constexpr std::size_t kHomes = 3;
-constexpr std::size_t kRooms = 3;
 constexpr std::size_t kGreatestWaiting = 128;
 
 }  // namespace
@@ -38,7 +36,7 @@ void UnrulyStage::beginRound(std::size_t commands, Random& random) {
 
 void UnrulyStage::command(std::size_t caller, Random& random) {
   platform_->answers()->waitUntilFewer(kGreatestWaiting);
-  const CommandMix mix{.homes = {0, 1, 2}, .rooms = kRooms, .isHomeNamed = false};
+  const CommandMix mix{.homes = {0, 1, 2}, .rooms = kLoadRooms, .isHomeNamed = false};
   const LoadCommand command = mix.draw(random);
   const auto ledger = std::make_shared<Ledger>();
   const Ledger::Scope scope(ledger);
@@ -72,9 +70,9 @@ void UnrulyStage::change(std::size_t /*caller*/, Random& random) {
 /// New homes, so that those of before end as soon as nobody looks at them.
 void UnrulyStage::changeHomes(Random& random) {
   std::vector<std::shared_ptr<NDHome>> homes;
-  for (std::size_t number = 0; number < kHomes; ++number) {
+  for (std::size_t number = 0; number < kLoadHomes; ++number) {
     if (random.oneIn(5)) continue;
-    HomeData data = changedHome(number, kRooms, random);
+    HomeData data = changedHome(number, kLoadRooms, random);
     if (random.oneIn(16)) data.primary = !data.primary;
     homes.push_back(UnrulyHome::make(data, random, platform_->answers()));
     record_.lives.add("homes", homes.back());
