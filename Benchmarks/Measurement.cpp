@@ -67,7 +67,7 @@ void report(benchmark::State& state, const Row& row) {
   state.counters["floor"] = row.floor;
   state.counters["goal"] = row.goal;
   state.counters["isLeast"] = row.isLeast ? 1 : 0;
-  state.counters["isBytes"] = row.isBytes ? 1 : 0;
+  state.counters["unit"] = static_cast<double>(row.unit);
 }
 
 void measureRow(benchmark::State& state, Row row, const Work& ours, const Work& floor,

@@ -22,6 +22,8 @@ void setTimePerRow(std::chrono::milliseconds time);
 /// short is run many times between two looks at the clock.
 [[nodiscard]] std::vector<double> leastNanoseconds(const std::vector<Work>& pieces);
 
+enum class Unit { nanoseconds, bytes, commands };
+
 /// One line of the table.
 struct Row {
   std::string name;
@@ -29,7 +31,7 @@ struct Row {
   double floor = 0;
   double goal = 0;  ///< The greatest ratio, or with `isLeast` the least; 0 is none.
   bool isLeast = false;
-  bool isBytes = false;  ///< What is not bytes is nanoseconds.
+  Unit unit = Unit::nanoseconds;
 };
 
 /// Puts the row into the table, under the size `state.range(0)`.

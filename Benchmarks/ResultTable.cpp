@@ -4,15 +4,19 @@
 #include <cstdio>
 #include <string>
 
+#include "Measurement.h"
+
 namespace nidus {
 namespace {
 
 constexpr int kNameWidth = 52;
 
-std::string quantity(double value, bool isBytes) {
+std::string quantity(double value, Unit unit) {
   std::array<char, 32> text{};
-  if (isBytes) {
+  if (unit == Unit::bytes) {
     std::snprintf(text.data(), text.size(), "%.0f B", value);
+  } else if (unit == Unit::commands) {
+    std::snprintf(text.data(), text.size(), "%.1f", value);
   } else if (value < 10'000) {
     std::snprintf(text.data(), text.size(), "%.1f ns", value);
   } else if (value < 10'000'000) {
@@ -71,12 +75,12 @@ void ResultTable::printRow(const Run& run) {
   const double ours = run.counters.at("ours");
   const double floor = run.counters.at("floor");
   const double goal = run.counters.at("goal");
-  const bool isBytes = run.counters.at("isBytes") != 0;
+  const auto unit = static_cast<Unit>(static_cast<int>(run.counters.at("unit")));
   const double ratio = ours / floor;
   ++rows_;
   std::printf("%-*s %7lld %13s %13s %8.2f ", kNameWidth, run.report_label.c_str(),
-              static_cast<long long>(run.complexity_n), quantity(ours, isBytes).c_str(),
-              quantity(floor, isBytes).c_str(), ratio);
+              static_cast<long long>(run.complexity_n), quantity(ours, unit).c_str(),
+              quantity(floor, unit).c_str(), ratio);
   if (goal == 0) {
     std::printf("%6s\n", "-");
     return;
@@ -89,7 +93,7 @@ void ResultTable::printRow(const Run& run) {
 
 void ResultTable::printGrowth(const Run& run) {
   std::printf("%-*s growth: %s times %s", kNameWidth, "", formOf(run.complexity).c_str(),
-              quantity(run.GetAdjustedRealTime(), false).c_str());
+              quantity(run.GetAdjustedRealTime(), Unit::nanoseconds).c_str());
 }
 
 }  // namespace nidus

@@ -61,13 +61,13 @@ void BM_MemoryGrowth(benchmark::State& state, Row row) {
 }
 
 BENCHMARK_CAPTURE(BM_Memory, 12, 12,
-                  Row{.name = "memory of a command, names of 12", .goal = 1, .isBytes = true})
+                  Row{.name = "memory of a command, names of 12", .goal = 1, .unit = Unit::bytes})
     ->Apply(everySizeWithoutGrowth);
 BENCHMARK_CAPTURE(BM_Memory, 24, 24,
-                  Row{.name = "memory of a command, names of 24", .goal = 1, .isBytes = true})
+                  Row{.name = "memory of a command, names of 24", .goal = 1, .unit = Unit::bytes})
     ->Apply(everySizeWithoutGrowth);
 BENCHMARK_CAPTURE(BM_MemoryGrowth, ten_commands,
-                  Row{.name = "memory left by ten commands", .goal = 1, .isBytes = true})
+                  Row{.name = "memory left by ten commands", .goal = 1, .unit = Unit::bytes})
     ->Arg(1'000)
     ->Iterations(1)
     ->UseManualTime();
