@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <functional>
 #include <map>
 
@@ -35,10 +36,9 @@ class FilterInput {
   [[nodiscard]] const FlatRecords& records() const { return records_; }
   /// The last service that is in a group: whoever looks for it passes all before it.
   [[nodiscard]] const FlatRecord& lastOfAGroup() const {
-    for (auto record = records_.rbegin(); record != records_.rend(); ++record) {
-      if (!record->group.empty()) return *record;
-    }
-    return records_.front();
+    const auto last = std::find_if(records_.rbegin(), records_.rend(),
+                                   [](const FlatRecord& record) { return !record.group.empty(); });
+    return last == records_.rend() ? records_.front() : *last;
   }
 
  private:
