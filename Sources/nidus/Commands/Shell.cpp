@@ -20,7 +20,10 @@ ExitStatus runShell(Workspace& workspace) {
     declareWorkspaceCommands(program, workspace);
   });
   const bool isOnTerminal = isatty(STDIN_FILENO) != 0 && isatty(STDOUT_FILENO) != 0;
-  return (*session)->statusAfter(isOnTerminal ? shell.talk() : shell.runLines(std::cin));
+  const ExitStatus status = isOnTerminal ? shell.talk() : shell.runLines(std::cin);
+  // The session of the beginning may be gone: `explain` ends it.
+  const auto last = workspace.home();
+  return last ? (*last)->statusAfter(status) : report(last.failure());
 }
 
 }  // namespace

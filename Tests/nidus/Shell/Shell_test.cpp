@@ -92,6 +92,12 @@ TEST_F(ShellCommandTest, GivesTheRestOfItsInputToAPerform) {
   EXPECT_THAT(end.output, HasSubstr("COMMAND_SUCCESS"));
 }
 
+TEST_F(ShellCommandTest, OutlivesAnExplanation) {
+  const ProgramEnd end = runLines("explain get power\n");
+  EXPECT_EQ(end.signal, 0);
+  EXPECT_EQ(end.exitStatus, 0) << end.errors;
+}
+
 TEST_F(ShellCommandTest, ShowsTheTimeOfALine) {
   TerminalProcess terminal(startOnTerminal());
   ASSERT_TRUE(terminal.waitFor("nidus> "));
