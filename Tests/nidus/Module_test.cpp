@@ -1,4 +1,5 @@
 #include <sys/stat.h>
+#include <unistd.h>
 
 #include "nidus/ProgramTest.h"
 
@@ -63,6 +64,18 @@ TEST_F(InstalledModuleTest, MustNotBeOthersToChange) {
                 HasSubstr("attention  plug-in\n  attention  " + place + ": others may change it"));
     ::chmod(place.c_str(), 0755);
   }
+}
+
+TEST_F(InstalledModuleTest, MayBelongToTheOwnerOfTheProgram) {
+  if (::geteuid() != 0) GTEST_SKIP() << "only an administrator can give files away";
+  constexpr uid_t kSomebody = 12345;
+  install(NIDUS_SILENT_MODULE);
+  ASSERT_EQ(::chown(module().c_str(), kSomebody, kSomebody), 0);
+  EXPECT_THAT(runInstalled({"sync"}).errors,
+              IsOneFailure(module() + ": it belongs to another user"));
+  ASSERT_EQ(::chown(program().c_str(), kSomebody, kSomebody), 0);
+  EXPECT_THAT(runInstalled({"perform"}, "{}\n").errors,
+              IsOneFailure("standard input: line 1: the plug-in gave no reply"));
 }
 
 TEST_F(InstalledModuleTest, IsNotLookedForInTheWorkingFolder) {

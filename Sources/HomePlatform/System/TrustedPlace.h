@@ -6,9 +6,10 @@
 
 namespace nidus {
 
-/// Whose word counts: a file or folder is trusted when it belongs to the user or to root and has no
-/// write permission for its group or for all. What others could have written is refused, as with it
-/// they would decide what the assistant does. The failure names the place and the remedy.
+/// Whose word counts: a file or folder is trusted when it belongs to the user, to root or to the
+/// owner of the running program, and has no write permission for its group or for all. What others
+/// could have written is refused, as with it they would decide what the assistant does. The failure
+/// names the place and the remedy.
 
 /// Fails when others may change the file or folder. One that is missing is trusted. What leads
 /// there is not looked at, but for a symbolic link that `path` itself is.

@@ -77,7 +77,8 @@ ExitStatus listPreferences(const PreferenceInput& input, Workspace& workspace) {
   std::string text;
   JsonValue::Array list;
   for (const PreferenceReport& each : reader->all()) {
-    text += (text.empty() ? "" : "\n") + textOf(each);
+    if (!text.empty()) text += '\n';
+    text += textOf(each);
     list.push_back(jsonOf(each));
   }
   if (!input.isJson) return printText(text);
