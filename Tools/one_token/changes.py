@@ -216,8 +216,17 @@ class Finder:
             return
         items = source.items(i)
         for (first, last), (next_first, next_last) in zip(items, items[1:]):
+            if self._shape(first) != self._shape(next_first):
+                continue
             self._add("order", first, next_last, source.between(next_first, next_last) + ", " +
                       source.between(first, last))
+
+    def _shape(self, first):
+        """What kind of argument begins with a token; those of two kinds do not fit in each other's
+        places."""
+        token = self.source.tokens[first]
+        shape = token.text if token.text in {"&", "*", "[", "{"} else token.kind
+        return "word" if shape in {"text", "number", "sign"} else shape
 
     def _is_call(self, i):
         before = self.source.tokens[i - 1]

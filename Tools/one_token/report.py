@@ -16,12 +16,17 @@ class Report:
         self.verdicts = {}
         if path.exists():
             self._read()
-        self._write()
 
     def forget_unnoticed(self):
         """Those are tried again, because tests may have been added."""
         self.verdicts = {name: verdict for name, verdict in self.verdicts.items()
                          if verdict != "nobody"}
+
+    def write(self):
+        """Writes down what is known, before the first `add`."""
+        lines = [self._head(file) + "\n" for file in self.hashes]
+        lines += [line_of(name, verdict) for name, verdict in self.verdicts.items()]
+        self.path.write_text("".join(lines), encoding="utf-8")
 
     def add(self, change, verdict):
         with self.lock:
@@ -34,11 +39,6 @@ class Report:
         known = {line for line in lines if line.startswith("# ")}
         same = {file for file in self.hashes if self._head(file) in known}
         self.verdicts = dict(parsed(line) for line in lines if line.split(":")[0] in same)
-
-    def _write(self):
-        lines = [self._head(file) + "\n" for file in self.hashes]
-        lines += [line_of(name, verdict) for name, verdict in self.verdicts.items()]
-        self.path.write_text("".join(lines), encoding="utf-8")
 
     def _head(self, file):
         return f"# {file} {self.hashes[file]}"

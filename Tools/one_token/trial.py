@@ -1,7 +1,6 @@
-"""Builds the plug-in with a change and runs the tests on it, without touching the checkout."""
+"""Runs the tests on the plug-in with a change, without touching the checkout."""
 
 import os
-import pathlib
 import re
 import resource
 import shlex
@@ -9,14 +8,15 @@ import shutil
 import signal
 import subprocess
 
-# The flags of the project's own build with clang; what these refuse, nobody could land.
-FLAGS = ("-std=c++20 -O0 -fPIC -fvisibility=hidden -fvisibility-inlines-hidden -ffp-contract=off "
-         "-Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wthread-safety -Werror").split()
+from one_token.variants import FLAGS, VariantBuild
+
 LINKER = "lld" if shutil.which("ld.lld") else "gold"
+# The tests that may notice a change of a folder, and those of the whole module, which follow.
 UNIT_TESTS = {"Assistant": ["AssistantTests"], "Logging": ["LoggingTests", "AssistantTests"]}
 MODULE_TESTS = ["ModuleTests", "ReplayTests"]
-CPU_SECONDS = 20  # Of one process; the slowest needs less than three.
-WALL_SECONDS = 120
+MODULE_UNIT = "Sources/Assistant/Module.cpp"
+CPU_SECONDS = 20  # Of one process; the slowest needs less than five.
+WALL_SECONDS = 300
 MEMORY = 4 << 30
 
 
@@ -34,62 +34,46 @@ def run(command, folder=None):
 
 
 class Workshop:
-    """All that the trials share: copies of the sources, precompiled headers, and what is linked
-    with a changed unit. What stands in the build folder is copied, so that it may change."""
+    """All that the trials start from: copies of the sources and of what is linked with the changed
+    units, so that the checkout and its build folder may change meanwhile."""
 
-    def __init__(self, checkout, work, build="dev"):
-        self.build = checkout / "build" / build
+    def __init__(self, checkout, work, preset):
+        self.build = checkout / "build" / preset
         self.work = work
         self.sources = work / "Sources"
-        work.mkdir(parents=True, exist_ok=True)
-        self._build_tests(checkout, build)
-        self._copy_sources(checkout / "Sources")
-        self.module_link = self._link_command("NidusAssistant")
-        self.test_links = {name: self._link_command(name)
-                           for name in ("AssistantTests", "LoggingTests")}
+        if not (self.build / "build.ninja").exists():
+            run(["cmake", "--preset", preset], checkout)
+        run(["cmake", "--build", self.build, "--target", "AssistantTests", "LoggingTests",
+             *MODULE_TESTS])
+        shutil.rmtree(work / "Sources", ignore_errors=True)
+        for folder in ("PlatformModel", *UNIT_TESTS):
+            shutil.copytree(checkout / "Sources" / folder, self.sources / folder)
+        self.links = {target: self._link_command(target)
+                      for target in ("AssistantTests", "LoggingTests", "NidusAssistant")}
         for program in ["nidus", *MODULE_TESTS]:
             shutil.copy2(self.build / "bin" / program, work / program)
+
+    def units(self):
+        return sorted(str(path.relative_to(self.work)) for folder in UNIT_TESTS
+                      for path in (self.sources / folder).glob("*.cpp"))
 
     def units_of(self, file):
         """The units that a change of `file` reaches."""
         if file.endswith(".cpp"):
             return [file]
-        units = sorted(str(path.relative_to(self.work)) for folder in UNIT_TESTS
-                       for path in (self.sources / folder).glob("*.cpp"))
-        return [unit for unit in units if self._includes(unit, file.removeprefix("Sources/"))]
+        return [unit for unit in self.units() if self._includes(unit, file, set())]
 
-    def precompile(self, unit):
-        """Compiles once what a unit includes."""
-        header = self.work / (pathlib.Path(unit).stem + ".h")
-        includes = re.findall(r"^#include .*\n", (self.work / unit).read_text(), re.MULTILINE)
-        header.write_text("".join(includes))
-        run(["clang++", *FLAGS, f"-I{self.sources}", "-Xclang", "-fpch-instantiate-templates",
-             "-x", "c++-header", header, "-o", f"{header}.pch"])
-        return f"{header}.pch"
-
-    def _build_tests(self, checkout, build):
-        if not (self.build / "build.ninja").exists():
-            run(["cmake", "--preset", build], checkout)
-        run(["cmake", "--build", self.build, "--target", "AssistantTests", "LoggingTests",
-             *MODULE_TESTS])
-
-    def _copy_sources(self, sources):
-        shutil.rmtree(self.sources, ignore_errors=True)
-        for folder in ("PlatformModel", *UNIT_TESTS):
-            shutil.copytree(sources / folder, self.sources / folder)
-
-    def _includes(self, file, header, seen=None):
-        seen = set() if seen is None else seen
+    def _includes(self, file, header, seen):
         if file in seen or not (self.work / file).exists():
             return False
         seen.add(file)
         included = re.findall(r'^#include "(.*)"', (self.work / file).read_text(), re.MULTILINE)
-        return any(name == header or self._includes(f"Sources/{name}", header, seen)
+        return any(f"Sources/{name}" == header or self._includes(f"Sources/{name}", header, seen)
                    for name in included)
 
     def _link_command(self, target):
-        """What links a target, on copies without debug information; the last argument of the
-        command that the build has is behind it."""
+        """The build's command that links a target, without the target, with its inputs copied
+        without debug information."""
         commands = run(["ninja", "-C", self.build, "-t", "commands", target]).splitlines()
         words = shlex.split(commands[-1])
         words = words[words.index("&&") + 1:]
@@ -110,81 +94,47 @@ class Workshop:
         return str(copy)
 
 
-class Trial:
-    """Tries changes, one at a time, in a folder of its own."""
+class Programs:
+    """Test programs and module with changed units, in a folder of their own."""
 
-    def __init__(self, workshop, precompiled, folder):
+    def __init__(self, workshop, folder):
         self.workshop = workshop
-        self.precompiled = precompiled
         self.folder = folder
         shutil.rmtree(folder, ignore_errors=True)
         (folder / "bin").mkdir(parents=True)
         (folder / "lib/nidus").mkdir(parents=True)
         shutil.copy2(workshop.work / "nidus", folder / "bin/nidus")
 
-    def verdict(self, change):
-        """Which program notices the change, "nobody", or "compiler" when it cannot be built."""
-        text = (self.workshop.work / change.file).read_text(encoding="utf-8")
-        for alternative in change.alternatives:
-            objects = self._compile(change.file, change.applied(text, alternative))
-            if objects:
-                return self._noticed_by(change.file, objects)
-        return "compiler"
+    def link(self, objects):
+        """Links `objects`, by unit; says whether that could be done."""
+        logging = [made for unit, made in objects.items() if "/Logging/" in unit]
+        linked = [made for unit, made in objects.items() if unit != MODULE_UNIT]
+        return (self._link("AssistantTests", linked, "AssistantTests")
+                and self._link("LoggingTests", logging, "LoggingTests")
+                and self._link("NidusAssistant", objects.values(), "lib/nidus/NidusAssistant.so"))
 
-    def verdict_of_nothing(self):
-        """The same without a change: "nobody", when all tests pass."""
-        return self._noticed_by("Sources/Logging/WLOLog.cpp", [])
-
-    def _compile(self, file, text):
-        if file.endswith(".cpp"):
-            unit = self.folder / "unit.cpp"
-            unit.write_text(text, encoding="utf-8")
-            return self._compile_unit(unit, ["-include-pch", self.precompiled[file]], "unit.o")
-        header = self.folder / file
-        header.parent.mkdir(parents=True, exist_ok=True)
-        header.write_text(text, encoding="utf-8")
-        objects = []
-        for i, unit in enumerate(self.workshop.units_of(file)):
-            made = self._compile_unit(self.workshop.work / unit, [f"-I{self.folder}/Sources"],
-                                      f"unit{i}.o")
-            if not made:
-                break
-            objects += made
-        else:
-            header.unlink()
-            return objects
-        header.unlink()
-        return None
-
-    def _compile_unit(self, unit, options, name):
-        target = str(self.folder / name)
-        done = subprocess.run(["clang++", *FLAGS, *options, f"-I{self.workshop.sources}", "-c",
-                               str(unit), "-o", target], stderr=subprocess.DEVNULL, check=False)
-        return [target] if done.returncode == 0 else None
-
-    def _noticed_by(self, file, objects):
-        if not file.endswith("/Module.cpp"):
-            for name in UNIT_TESTS[file.split("/")[1]]:
-                program = self.folder / name
-                if not (self._link(self.workshop.test_links[name], objects, program)
-                        and self._passes(program)):
-                    return name
-        if not self._link(self.workshop.module_link, objects,
-                          self.folder / "lib/nidus/NidusAssistant.so"):
-            return "linker"
+    def noticed_by(self, file, number=0):
+        """The first program whose tests fail with the change of that number, which is one of
+        `file`; "nobody" when all pass."""
+        unit_tests = [] if file == MODULE_UNIT else UNIT_TESTS[file.split("/")[1]]
+        for name in unit_tests:
+            if not self._passes(self.folder / name, number):
+                return name
         for name in MODULE_TESTS:
-            if not self._passes(self.workshop.work / name):
+            if not self._passes(self.workshop.work / name, number):
                 return name
         return "nobody"
 
-    def _link(self, command, objects, target):
+    def _link(self, target, objects, output):
         """Links with the changed units in front, so that their definitions are the ones taken."""
-        command = [command[0], f"-fuse-ld={LINKER}", "-Wl,--allow-multiple-definition", *objects, *command[1:], "-o",
-                   str(target)]
+        first, *others = self.workshop.links[target]
+        command = [first, f"-fuse-ld={LINKER}", "-Wl,--allow-multiple-definition", *objects,
+                   *others, "-o", str(self.folder / output)]
         return subprocess.run(command, stderr=subprocess.DEVNULL, check=False).returncode == 0
 
-    def _passes(self, program):
-        environment = dict(os.environ, NIDUS_PROGRAM=str(self.folder / "bin/nidus"),
+    def _passes(self, program, number):
+        environment = dict(os.environ, ONE_TOKEN_CHANGE=str(number),
+                           NIDUS_PROGRAM=str(self.folder / "bin/nidus"),
                            NIDUS_MODULE_FILE=str(self.folder / "lib/nidus/NidusAssistant.so"))
         with subprocess.Popen([str(program), "--gtest_fail_fast", "--gtest_brief=1"],
                               stdin=subprocess.DEVNULL, stdout=subprocess.DEVNULL,
@@ -195,6 +145,64 @@ class Trial:
             except subprocess.TimeoutExpired:
                 os.killpg(process.pid, signal.SIGKILL)
                 return False
+
+
+class Trials:
+    """Tries changes: most of them in programs that hold all, the others one by one."""
+
+    def __init__(self, workshop, changes, jobs):
+        """`changes` are by number, from 1."""
+        self.workshop = workshop
+        self.changes = changes
+        folder = workshop.work / "all"
+        shutil.rmtree(folder, ignore_errors=True)
+        build = VariantBuild(workshop.sources, folder, changes)
+        units = workshop.units()
+        self.all = Programs(workshop, workshop.work / "programs")
+        if not self.all.link(dict(zip(units, build.objects(units, jobs)))):
+            raise TrialError("the changed units cannot be linked")
+        noticer = self.all.noticed_by("Sources/Logging/WLOLog.cpp")
+        if noticer != "nobody":
+            raise TrialError(f"{noticer} fails without any change")
+        self.built, self.left_out = build.built(), build.left_out()
+        self.spare = [Programs(workshop, workshop.work / f"apart{i}") for i in range(jobs)]
+
+    def verdict(self, number):
+        """Which program notices the change, "nobody", or "compiler" when it cannot be built."""
+        if number in self.built:
+            return self.all.noticed_by(self.changes[number].file, number)
+        if number in self.left_out:
+            return "compiler"
+        programs = self.spare.pop()
+        try:
+            return self._verdict_apart(self.changes[number], programs)
+        finally:
+            self.spare.append(programs)
+
+    def _verdict_apart(self, change, programs):
+        text = (self.workshop.work / change.file).read_text(encoding="utf-8")
+        for alternative in change.alternatives:
+            file = programs.folder / change.file
+            file.parent.mkdir(parents=True, exist_ok=True)
+            file.write_text(change.applied(text, alternative), encoding="utf-8")
+            objects = self._compile(programs.folder, self.workshop.units_of(change.file))
+            file.unlink()
+            if objects and programs.link(objects):
+                return programs.noticed_by(change.file)
+        return "compiler"
+
+    def _compile(self, folder, units):
+        """Compiles units with the changed file in `folder`; none when one does not compile."""
+        objects = {}
+        for unit in units:
+            source = folder / unit if (folder / unit).exists() else self.workshop.work / unit
+            objects[unit] = str(folder / unit.replace("/", "_")) + ".o"
+            done = subprocess.run(["clang++", *FLAGS, f"-I{folder}/Sources",
+                                   f"-I{self.workshop.sources}", "-c", str(source), "-o",
+                                   objects[unit]], stderr=subprocess.DEVNULL, check=False)
+            if done.returncode:
+                return None
+        return objects
 
 
 def limit_resources():
