@@ -41,7 +41,7 @@ class FieldWriter {
 
  private:
   std::string& begin(std::string_view key) {
-    if (out_.size() > 1) out_ += ", ";
+    if (out_ != "{") out_ += ", ";
     return out_.append(key).append(": ");
   }
 

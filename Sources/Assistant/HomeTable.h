@@ -27,13 +27,13 @@ class HomeTable {
     if (home) itemsOf(home).push_back(std::move(item));
   }
 
-  /// Hands each home that is still there, never null, with its items, never empty, to `visit`.
+  /// Hands each home that is still there, never null, with its items, never empty, to `visit`. Called
+  /// once.
   template <class Visit>
   void forEachHome(const Visit& visit) {
     for (Entry& entry : entries_) {
       if (const auto home = entry.home.lock()) visit(home, std::move(entry.items));
     }
-    entries_.clear();
   }
 
  private:

@@ -282,18 +282,10 @@ NDAssistantCommand::CharacteristicList NDAssistantCommand::filterObjects_forchar
 }
 
 ObjectList NDAssistantCommand::objectsWithIdentifierList(
-    const std::vector<NDURLRef>& identifiers) const {
-  ObjectList found;
+    const std::vector<NDURLRef>& /*identifiers*/) const {
   // The search starts from no list instead of the snapshot, so nothing is ever found. Hosts have
   // come to rely on that reply; it is not to be repaired here.
-  ObjectList searched;
-  for (const NDURLRef& identifier : identifiers) {
-    searched = matching(searched, [&identifier](const HomeObjectRecord& object) {
-      return isEqual(object.objectIdentifier->text(), identifier->text());
-    });
-    append(found, searched);
-  }
-  return found;
+  return {};
 }
 
 }  // namespace nidus

@@ -1,5 +1,4 @@
-#include <compare>
-#include <unordered_map>
+#include <unordered_set>
 
 #include "Assistant/ActionRun.h"
 #include "Assistant/HomeTable.h"
@@ -16,13 +15,11 @@
 namespace nidus {
 namespace {
 
-/// The characteristics that are to be written, each once and in the order in which they were met,
-/// with the value that was decided for each.
+/// The characteristics that are to be written, each once and in the order in which they were met.
 class WriteTable {
  public:
-  void decide(const std::shared_ptr<NDCharacteristic>& characteristic, NDValueRef value) {
-    const auto [entry, isNew] = values_.insert_or_assign(characteristic.get(), std::move(value));
-    if (isNew) characteristics_.push_back(characteristic);
+  void add(const std::shared_ptr<NDCharacteristic>& characteristic) {
+    if (known_.insert(characteristic.get()).second) characteristics_.push_back(characteristic);
   }
 
   [[nodiscard]] const NDAssistantCommand::CharacteristicList& characteristics() const {
@@ -31,7 +28,7 @@ class WriteTable {
 
  private:
   NDAssistantCommand::CharacteristicList characteristics_;
-  std::unordered_map<const NDCharacteristic*, NDValueRef> values_;
+  std::unordered_set<const NDCharacteristic*> known_;
 };
 
 const HomeObjectRecord* firstScene(const NDAssistantCommand::ObjectList& objects) {
@@ -44,44 +41,28 @@ const HomeObjectRecord* firstScene(const NDAssistantCommand::ObjectList& objects
   return nullptr;
 }
 
-/// The value within the limits, both of which are compared with the value as it was asked for.
-NDValueRef clamped(const NDValueRef& value,
-                   const std::shared_ptr<const NDCharacteristicMetadata>& limits) {
-  const NDValueRef& maximum = property(limits, &NDCharacteristicMetadata::maximumValue);
-  const NDValueRef& minimum = property(limits, &NDCharacteristicMetadata::minimumValue);
-  NDValueRef decided = value;
-  if (maximum && std::is_lt(maximum->compare(value))) decided = maximum;
-  if (minimum && std::is_gt(minimum->compare(value))) decided = minimum;
-  return decided;
-}
-
-/// Decides what a writable characteristic is to become; it is left alone when it lacks the limit
-/// that the action names.
-void decide(WriteTable& table, const std::shared_ptr<NDCharacteristic>& characteristic,
-            const NDString& actionType, const NDValueRef& setValue) {
-  const auto& limits = characteristic->metadata();
-  if (actionType == VAHAActionTypeSETValue) {
-    table.decide(characteristic, clamped(setValue, limits));
-    return;
+/// Says whether an action of that type writes a writable characteristic: one that goes to a limit
+/// leaves alone what lacks it, otherwise the limits decide nothing.
+bool isToBeWritten(const NDCharacteristic& characteristic, const NDString& actionType) {
+  if (actionType == VAHAActionTypeSETValue) return true;
+  const auto& limits = characteristic.metadata();
+  if (actionType == VAHAActionTypeSET_TO_MAXIMUMValue) {
+    return property(limits, &NDCharacteristicMetadata::maximumValue) != nullptr;
   }
-  const bool toMaximum = actionType == VAHAActionTypeSET_TO_MAXIMUMValue;
-  if (!toMaximum && !(actionType == VAHAActionTypeSET_TO_MINIMUMValue)) return;
-  const NDValueRef& limit = property(limits, toMaximum ? &NDCharacteristicMetadata::maximumValue
-                                                       : &NDCharacteristicMetadata::minimumValue);
-  if (limit) table.decide(characteristic, limit);
+  return actionType == VAHAActionTypeSET_TO_MINIMUMValue &&
+         property(limits, &NDCharacteristicMetadata::minimumValue) != nullptr;
 }
 
 /// Decides about each characteristic. What is read-only gets its result now and never reaches the
 /// platform.
 WriteTable decideWrites(const ActionRun& run,
-                        const NDAssistantCommand::CharacteristicList& characteristics,
-                        const NDValueRef& setValue) {
+                        const NDAssistantCommand::CharacteristicList& characteristics) {
   WriteTable table;
   for (const auto& characteristic : characteristics) {
-    if (isWritable(*characteristic)) {
-      decide(table, characteristic, run.action()->actionType(), setValue);
-    } else {
+    if (!isWritable(*characteristic)) {
       run.addResult(VAHAActionOutcomeREAD_ONLYValue, characteristic->service());
+    } else if (isToBeWritten(*characteristic, run.action()->actionType())) {
+      table.add(characteristic);
     }
   }
   return table;
@@ -100,8 +81,8 @@ void batchDidWrite(const ActionRun& run, const std::optional<NDError>& error,
   if (!isUnlocked) run.reportUnlockRequired();
 }
 
-/// Writes `setValue` to all of the table. The values decided there are not what is written: they
-/// say which characteristics are written, the platform judges the value itself.
+/// Writes `setValue` to all of the table as the assistant gave it, also when the action goes to a
+/// limit: the platform judges the value itself.
 void writeByHome(const std::shared_ptr<const ActionRun>& run, const WriteTable& writes,
                  const NDValueRef& setValue) {
   using Tuple = NDCharacteristicWriteRequestTuple;
@@ -149,7 +130,7 @@ void NDAssistantCommand::handleSetActionTypes_serviceType_forObjects_completionH
       adjustSetValue(getValueOfType(valueType, action), valueType,
                      property(action->value(), &VAHAValue::units), attribute);
   const auto run = std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler);
-  writeByHome(run, decideWrites(*run, characteristics, setValue), setValue);
+  writeByHome(run, decideWrites(*run, characteristics), setValue);
 }
 
 }  // namespace nidus

@@ -173,7 +173,7 @@ void NDAssistantSyncHome::getChangeAfterAnchor_changeInfo(const NDString& anchor
                     "_postAnchors.count == _entities.count");
     }
     std::size_t index = 0;
-    if (anchor && count > 0) {
+    if (anchor && postAnchors_) {
       const auto found = std::find(postAnchors_->begin(), postAnchors_->end(), anchor);
       index = static_cast<std::size_t>(found - postAnchors_->begin()) + 1;
     }

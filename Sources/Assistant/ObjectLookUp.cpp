@@ -69,8 +69,7 @@ void splitIdentifier(const NDURLRef& identifier, NDString& kind, NDString& objec
     objectID = kind = home = accessory = nullptr;
   }
   kind = identifier->pathComponents().at(1);
-  const NDString query = identifier->query();
-  if (!query) return;
+  const NDString query = identifier->query();  // A URL without one has the tokens of no text.
   const Tokens tokens = tokensOf(query.view());
   readKey(tokens, "id", objectID);
   readKey(tokens, "home", home);

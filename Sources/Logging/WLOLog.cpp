@@ -66,21 +66,25 @@ bool isConnected() {
   return true;
 }
 
+bool isPlace(std::string_view format) {
+  return format.starts_with("%@") || format.starts_with("%s");
+}
+
 /// Puts the arguments in the places of "%@" and "%s"; a place without an argument stays as it is.
 std::string formatted(std::string_view format, std::span<const WLOArgument> arguments) {
   std::string text;
   auto argument = arguments.begin();
-  for (std::size_t i = 0; i < format.size(); ++i) {
-    const char next = i + 1 < format.size() ? format[i + 1] : '\0';
-    if (format[i] == '%' && next == '%') {
+  while (!format.empty()) {
+    std::size_t length = 2;
+    if (format.starts_with("%%")) {
       text += '%';
-      ++i;
-    } else if (format[i] == '%' && (next == '@' || next == 's') && argument != arguments.end()) {
+    } else if (isPlace(format) && argument != arguments.end()) {
       (argument++)->appendTo(text);
-      ++i;
     } else {
-      text += format[i];
+      text += format.front();
+      length = 1;
     }
+    format.remove_prefix(length);
   }
   return text;
 }
