@@ -5,7 +5,6 @@
 
 #include "PlatformModel/System/NDMutex.h"
 #include "Support/FreshProcess.h"
-#include "Support/TestPlatform.h"
 
 namespace nidus {
 namespace {
@@ -44,6 +43,7 @@ CommandTest::CommandTest() : state_(std::make_unique<State>()) {
   EXPECT_EQ(NDPlatform::registerPlatform(TestPlatform::shared()), "");
   platform().setHomes({});
   platform().setSilent(false);
+  setReporting(TestPlatform::Reporting::queued);
   configureHomes(true);
   setLocale(true);
   logLevel(6);
@@ -69,6 +69,10 @@ std::shared_ptr<TestHome> CommandTest::useHome(HomeBuilder& builder) {
 void CommandTest::configureHomes(bool areConfigured) { platform().configureHomes(areConfigured); }
 
 void CommandTest::silencePlatform() { platform().setSilent(true); }
+
+void CommandTest::setReporting(TestPlatform::Reporting reporting) {
+  platform().setReporting(reporting);
+}
 
 void CommandTest::setLocale(std::optional<bool> isMetric) { platform().setLocale(isMetric); }
 

@@ -14,6 +14,7 @@
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "Support/HomeBuilder.h"
 #include "Support/TestHome.h"
+#include "Support/TestPlatform.h"
 
 namespace nidus {
 
@@ -36,6 +37,7 @@ class CommandTest : public ::testing::Test {
   void configureHomes(bool areConfigured);
   /// Homes are not reported any more.
   void silencePlatform();
+  void setReporting(TestPlatform::Reporting reporting);
   void setLocale(std::optional<bool> isMetric);
   void logLevel(int level);
 

@@ -132,6 +132,7 @@ TEST_F(FilterTest, KeepsTheHomeItselfWhenHomesShareAName) {
 }
 
 TEST_F(FilterTest, FindsNoListWithoutPrimaryHomeOfTheName) {
+  logLevel(4);
   snapshot({homeRecord("Home"), homeRecord("Home"), serviceRecord("Lamp", "Home")});
   primaryHome("Flat", "9E01-AB");
   EXPECT_THAT(find({}, "Home"), ElementsAre("null"));
@@ -170,6 +171,13 @@ TEST_F(FilterTest, WarnsOfAttributeOfOtherEntityType) {
               ElementsAre("4 Attribute specified in search filter with entityType not SERVICE(" +
                               searchFilter(search)->description() + ")",
                           "6 Incoming Filter: attribute=POWER/entity=ROOM/"));
+}
+
+TEST_F(FilterTest, WarnsWithoutTellingTheFilter) {
+  logLevel(4);
+  snapshot({roomRecord("Hall"), serviceRecord("Lamp")});
+  EXPECT_THAT(find({.entityType = "ROOM", .attribute = "POWER"}), IsEmpty());
+  EXPECT_EQ(log().size(), 1U);
 }
 
 TEST_F(FilterTest, NarrowsToEntityTypeWithoutLoggingIt) {
@@ -458,6 +466,7 @@ TEST_F(ReachTest, KeepsDuplicates) {
 TEST_F(ReachTest, LogsAndSkipsWhatIsNoService) {
   const auto home = HomeBuilder("Cottage").light("Lamp").room("Hall").build();
   const auto command = performed(home);
+  logLevel(4);
   const auto objects = command->allObjects();
   ASSERT_EQ(objects.size(), 3U);
   EXPECT_EQ(command->filterObjects_forcharacteristicType(objects, kPower).size(), 1U);

@@ -50,6 +50,7 @@ TEST_F(SceneTest, RunsForAnyTrueNumber) {
 }
 
 TEST_F(SceneTest, RefusesOtherAttributes) {
+  logLevel(4);
   const auto home = useHome(HomeBuilder("Cottage").scene("Good night"));
   runScene("POWER", booleanValue(true));
   runScene("enabled", booleanValue(true));
@@ -67,6 +68,7 @@ TEST_F(SceneTest, RefusesMissingAttribute) {
 }
 
 TEST_F(SceneTest, RefusesWhatIsNotTrue) {
+  logLevel(4);
   const auto home = useHome(HomeBuilder("Cottage").scene("Good night"));
   runScene("ENABLED", booleanValue(false));
   runScene("ENABLED", nullptr);

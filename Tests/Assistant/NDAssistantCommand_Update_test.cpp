@@ -85,6 +85,17 @@ TEST_F(UpdateTest, WritesTheLimitItself) {
   EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS BRIGHTNESS=100 PERCENTAGE"));
 }
 
+TEST_F(UpdateTest, KeepsTheSumThatEqualsTheLimit) {
+  for (const auto& [light, type] :
+       {std::pair(brightness(95), "INCREASE"), std::pair(brightness(5), "DECREASE")}) {
+    SCOPED_TRACE(type);
+    const auto home = useHome(HomeBuilder("Cottage").light("Lamp", {light}));
+    update(type, "BRIGHTNESS");
+    ASSERT_THAT(home->writes(), SizeIs(1));
+    EXPECT_FALSE(home->writes()[0][0].value->isInteger());  // as the limits are
+  }
+}
+
 TEST_F(UpdateTest, KeepsValuesWithinTheLimits) {
   struct Case {
     const char* label;
@@ -166,6 +177,7 @@ TEST_F(UpdateTest, TogglesAgainstTheLimits) {
 }
 
 TEST_F(UpdateTest, RefusesActionsThatDoNotSuitTheType) {
+  logLevel(3);
   struct Case {
     const char* type;
     const char* attribute;
@@ -384,6 +396,7 @@ class RefusingCommand final : public NDAssistantCommand {
 };
 
 TEST_F(UpdateTest, ReportsWhatAnOverrideRefuses) {
+  logLevel(4);
   const auto home =
       useHome(HomeBuilder("Cottage").light("Lamp").serviceID(12).light("Bulb").serviceID(13));
   const auto request =

@@ -24,6 +24,7 @@ constexpr const char* kNoMatch = "FOUND_NO_MATCHING_ENTITIES";
 class PerformTest : public CommandTest {};
 
 TEST_F(PerformTest, FindsNoMatchWithoutConfiguredHomes) {
+  logLevel(5);
   configureHomes(false);
   perform(makeCommand(Search(), {}));
   EXPECT_THAT(replies(), ElementsAre(kNoMatch));
@@ -50,6 +51,20 @@ TEST_F(PerformTest, FindsNoMatchInNoHomes) {
   EXPECT_THAT(replies(), ElementsAre(kNoMatch));
   EXPECT_THAT(log(), IsEmpty());
   EXPECT_TRUE(isHandlerReleased());
+}
+
+TEST_F(PerformTest, HoldsTheReportUntilItHasAsked) {
+  useHome(HomeBuilder("Cottage").light("Lamp"));
+  setReporting(TestPlatform::Reporting::prompt);
+  perform(makeCommand({.service = "Lamp"}, {}));
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS"));
+}
+
+TEST_F(PerformTest, TakesAnEarlyReportForNoHomes) {
+  useHome(HomeBuilder("Cottage").light("Lamp"));
+  setReporting(TestPlatform::Reporting::early);
+  perform(makeCommand({.service = "Lamp"}, {}));
+  EXPECT_THAT(replies(), ElementsAre(kNoMatch));
 }
 
 TEST_F(PerformTest, FindsNoMatchInEmptySnapshot) {
@@ -299,6 +314,13 @@ TEST_F(HandleCommandTest, RefusesUnknownActionTypes) {
                                  "6 Incoming Action: MELT/attribute=POWER/value=(null)",
                                  "3 -[NDAssistantCommand handleCommandWithCompletionHandler:] ### "
                                  "Vela sent an unsupported action type: MELT"));
+}
+
+TEST_F(HandleCommandTest, LogsRefusalsAtEveryThreshold) {
+  logLevel(3);
+  useHome(HomeBuilder("Cottage").light("Lamp"));
+  perform(makeCommand(Search(), {{.type = "MELT", .attribute = "POWER"}}));
+  EXPECT_THAT(log(), SizeIs(1));
 }
 
 TEST_F(HandleCommandTest, LogsTheActionWithItsValue) {

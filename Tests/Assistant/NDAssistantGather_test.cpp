@@ -212,6 +212,28 @@ TEST_F(NDAssistantGatherTest, ObjectsOfAHomeComeInOrder) {
                           "ZONE Ground floor", "SCENE Good night", "TRIGGER Sunset"));
 }
 
+TEST_F(NDAssistantGatherTest, SnapshotFillsItsMemory) {
+  platform().setHomes({HomeBuilder("Cabin").primary().room("Hall").build(), HomeBuilder("Cottage")
+                                                                                .room("Kitchen")
+                                                                                .room("Attic")
+                                                                                .light("Lamp")
+                                                                                .light("Fan")
+                                                                                .light("Stove")
+                                                                                .zone("Upstairs")
+                                                                                .zone("Downstairs")
+                                                                                .group("Evening")
+                                                                                .group("Morning")
+                                                                                .group("Noon")
+                                                                                .scene("Good night")
+                                                                                .scene("Movie")
+                                                                                .trigger("Sunset")
+                                                                                .trigger("Sunrise")
+                                                                                .build()});
+  const HomeObjectRecords list = records();
+  EXPECT_EQ(list.size(), 17U);
+  EXPECT_EQ(list.capacity(), list.size());
+}
+
 TEST_F(NDAssistantGatherTest, HomesComeOneAfterTheOther) {
   platform().setHomes({HomeBuilder("Hut").room("Attic").build(),
                        HomeBuilder("Cabin").room("Attic").room("Attic").build()});

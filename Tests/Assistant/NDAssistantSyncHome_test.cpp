@@ -37,6 +37,12 @@ class ChangeInfo final : public AFSyncChangeInfo {
   std::string postAnchor;
 };
 
+/// Runs each task at once, on the thread that brings it.
+class InlineQueue final : public NDQueue {
+ public:
+  void async(NDTask task) override { task(); }
+};
+
 class NDAssistantSyncHomeTest : public PlatformTest {
  protected:
   NDAssistantSyncHomeTest() : sync_(NDAssistantSyncHome::init()) {}
@@ -153,6 +159,16 @@ TEST_F(NDAssistantSyncHomeTest, AnchorSaysWhatFollows) {
   EXPECT_EQ(change(""), "end ");
 }
 
+TEST_F(NDAssistantSyncHomeTest, FinalAnchorEndsTheDataWherever) {
+  useHome(fourObjects());
+  begin();
+  sync_->setFinalAnchor("2");
+  EXPECT_EQ(change("1"), "E1 2");
+  EXPECT_EQ(change("2"), "end 2");
+  sync_->setFinalAnchor(nullptr);
+  EXPECT_EQ(change(nullptr), "E0 1");
+}
+
 TEST_F(NDAssistantSyncHomeTest, OneEntityHasTheFinalAnchor) {
   useHome(HomeBuilder("Cabin"));
   EXPECT_THAT(begin()->resets, ElementsAre("3405691582"));
@@ -210,6 +226,13 @@ TEST_F(NDAssistantSyncHomeTest, UnconfiguredHomesDropTheFormerSync) {
   EXPECT_EQ(change(nullptr), "end none");
 }
 
+TEST_F(NDAssistantSyncHomeTest, HoldsTheReportUntilItWaits) {
+  useHome(fourObjects());
+  platform().setReporting(TestPlatform::Reporting::prompt);
+  EXPECT_THAT(begin()->resets, ElementsAre("3405691582"));
+  EXPECT_THAT(log(), IsEmpty());
+}
+
 TEST_F(NDAssistantSyncHomeTest, SilentPlatformEndsTheWait) {
   useHome(fourObjects());
   platform().setSilent(true);
@@ -228,6 +251,15 @@ TEST_F(NDAssistantSyncHomeTest, WatchdogEndsASilentSync) {
   EXPECT_THAT(log(), ElementsAre("6 Timed out waiting for nidusd", "6 nidusd did not respond"));
   EXPECT_TRUE(sync_->done());
   EXPECT_TRUE(sync_->group()->wait({}));
+}
+
+TEST_F(NDAssistantSyncHomeTest, IsDoneBeforeTheGroupIsLeft) {
+  platform().setSilent(true);
+  begin();
+  bool wasDone = false;
+  sync_->group()->notify(std::make_shared<InlineQueue>(), [&] { wasDone = sync_->done(); });
+  platform().runUntilIdle();
+  EXPECT_TRUE(wasDone);
 }
 
 TEST_F(NDAssistantSyncHomeTest, LowerLogLevelHidesTheMessages) {

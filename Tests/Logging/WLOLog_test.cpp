@@ -278,6 +278,29 @@ TEST_F(WLOLogTest, MessageTakesAListOfArguments) {
   });
 }
 
+TEST_F(WLOLogTest, WithoutMemoryNothingIsLogged) {
+  inFreshProcess([] {
+    systemLog().exhaustMemory(true);
+    EXPECT_FALSE(WLOShouldLogAtLevel(0));
+    EXPECT_NO_THROW(WLOLog(0, "lost", {}));
+    systemLog().exhaustMemory(false);
+    EXPECT_TRUE(WLOShouldLogAtLevel(0));
+    WLOLog(0, "heard", {});
+    EXPECT_THAT(systemLog().lines(), ElementsAre("0 heard"));
+  });
+}
+
+TEST_F(WLOLogTest, LevelStaysAfterThePlatform) {
+  inFreshProcess([] {
+    EXPECT_EQ(threshold(), 4);
+    NDPlatform::unregisterPlatform(TestPlatform::shared());
+    setPreference(kWLOLogLevelKey, 7);
+    notifyOfChange();
+    EXPECT_EQ(threshold(), 4);
+    EXPECT_EQ(platform().testPreferences().synchronizations(), 1U);
+  });
+}
+
 TEST_F(WLOLogTest, WithoutPlatformNothingIsLogged) {
   inFreshProcess([] {
     NDPlatform::unregisterPlatform(TestPlatform::shared());

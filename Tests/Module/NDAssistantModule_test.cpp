@@ -11,6 +11,7 @@
 #include <utility>
 #include <vector>
 
+#include "Module/ScarceMemory.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/Assistant/VAHAFilter.h"
 #include "Support/ElfFile.h"
@@ -110,6 +111,7 @@ class OpenModuleTest : public ::testing::Test {
   OpenModuleTest() {
     EXPECT_EQ(NDPlatform::registerPlatform(TestPlatform::shared()), "");
     platform().configureHomes(true);
+    platform().setReporting(TestPlatform::Reporting::queued);
     platform().setHomes(
         {HomeBuilder("Cabin").room("Kitchen").light("Lamp", {power(true)}).build()});
   }
@@ -202,6 +204,31 @@ TEST_F(OpenModuleTest, SyncServesAnEntity) {
 
 TEST_F(OpenModuleTest, RecordsAreGathered) {
   EXPECT_THAT(gatheredRecords(), ElementsAre("|", "HOME Cabin", "SERVICE Lamp", "ROOM Kitchen"));
+}
+
+TEST_F(OpenModuleTest, RecordsWaitForThePlatform) {
+  platform().setReporting(TestPlatform::Reporting::prompt);
+  EXPECT_THAT(gatheredRecords(), ElementsAre("|", "HOME Cabin", "SERVICE Lamp", "ROOM Kitchen"));
+}
+
+TEST_F(OpenModuleTest, HomesReportedTooEarlyHaveNoRecords) {
+  platform().setReporting(TestPlatform::Reporting::early);
+  EXPECT_THAT(gatheredRecords(), ElementsAre("|"));
+}
+
+TEST_F(OpenModuleTest, WantOfMemoryIsAReason) {
+  const NDAssistantModule& module = openModule();
+  const Request request;
+  NDLogThreshold threshold;
+  Texts messages(4);
+  {
+    const ScarceMemory memory;
+    EXPECT_FALSE(module.makeCommand(request, nullptr, messages[0]));
+    EXPECT_FALSE(module.makeSyncHandler(messages[1]));
+    EXPECT_FALSE(module.gatherRecords([](const auto&) {}, messages[2]));
+    EXPECT_FALSE(module.readLogThreshold(threshold, messages[3]));
+  }
+  EXPECT_THAT(messages, ::testing::Each("std::bad_alloc"));
 }
 
 TEST_F(OpenModuleTest, UnconfiguredHomesHaveNoRecords) {

@@ -6,6 +6,7 @@ PlatformTest::PlatformTest() {
   EXPECT_EQ(NDPlatform::registerPlatform(TestPlatform::shared()), "");
   platform().setHomes({});
   platform().setSilent(false);
+  platform().setReporting(TestPlatform::Reporting::queued);
   platform().configureHomes(true);
   platform().setLocale(true);
   platform().setLogLevel(6);

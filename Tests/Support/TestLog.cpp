@@ -1,5 +1,7 @@
 #include "Support/TestLog.h"
 
+#include <new>
+
 namespace nidus {
 
 class TestLog::Client final : public NDSystemLogClient {
@@ -39,12 +41,14 @@ TestLog::~TestLog() = default;
 std::shared_ptr<NDSystemLogClient> TestLog::openClient(const NDString& identity,
                                                        const NDString& facility,
                                                        std::uint32_t options) {
+  if (isExhausted_) throw std::bad_alloc();
   const NDLock lock(mutex_);
   openings_.push_back({identity, facility, options});
   return client_;
 }
 
 std::unique_ptr<NDSystemLogMessage> TestLog::createMessage() {
+  if (isExhausted_) throw std::bad_alloc();
   return refusesMessages_ ? nullptr : std::make_unique<NDSystemLogMessage>();
 }
 

@@ -33,6 +33,8 @@ class TestLog final : public NDSystemLog {
 
   /// From now on there is no memory for messages.
   void refuseMessages() { refusesMessages_ = true; }
+  /// Whether opening a client and making a message throw for want of memory.
+  void exhaustMemory(bool isExhausted) { isExhausted_ = isExhausted; }
 
   [[nodiscard]] std::vector<Opening> openings() const;
   /// The filter masks in the order in which they were set.
@@ -48,6 +50,7 @@ class TestLog final : public NDSystemLog {
 
   const std::shared_ptr<Client> client_;
   std::atomic<bool> refusesMessages_ = false;
+  std::atomic<bool> isExhausted_ = false;
   mutable NDMutex mutex_;
   std::vector<Opening> openings_ ND_GUARDED_BY(mutex_);
 };

@@ -43,8 +43,11 @@ TestPlatform::~TestPlatform() = default;
 
 std::shared_ptr<NDHomeManager> TestPlatform::createHomeManager() {
   auto manager = std::make_shared<TestHomeManager>(homes_);
-  if (!isSilent_) manager->reportOn(sharedQueue_);
   lastManager_ = manager;
+  if (isSilent_) return manager;
+  if (reporting_ == Reporting::queued) manager->reportOn(sharedQueue_);
+  if (reporting_ == Reporting::prompt) manager->reportPromptly();
+  if (reporting_ == Reporting::early) manager->reportEarly();
   return manager;
 }
 

@@ -47,6 +47,10 @@ class TestPlatform final : public NDPlatform {
   void setHomes(const std::vector<std::shared_ptr<TestHome>>& homes);
   /// Whether they report by themselves.
   void setSilent(bool isSilent) { isSilent_ = isSilent; }
+  /// How they do so: through the shared queue (unless said otherwise), on the creating thread as
+  /// soon as they may, or before they may, as no platform should.
+  enum class Reporting { queued, prompt, early };
+  void setReporting(Reporting reporting) { reporting_ = reporting; }
   /// The manager created last; null when it is gone.
   [[nodiscard]] std::shared_ptr<TestHomeManager> lastManager() const { return lastManager_.lock(); }
 
@@ -80,6 +84,7 @@ class TestPlatform final : public NDPlatform {
   NDArray<NDHome> homes_;
   std::weak_ptr<TestHomeManager> lastManager_;
   bool isSilent_ = false;
+  Reporting reporting_ = Reporting::queued;
 };
 
 }  // namespace nidus
