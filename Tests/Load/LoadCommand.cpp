@@ -33,7 +33,7 @@ constexpr std::array kDeeds = {Deed{Aim::tell, VAHAActionTypeGETValue, ""},
                                Deed{Aim::refuse, VAHAActionTypeTOGGLEValue, "BRIGHTNESS"},
                                Deed{Aim::refuse, "FLY", "POWER"}};
 
-NDString maybeRenamed(NDString name, Random& random) {
+NDString maybeRenamed(const NDString& name, Random& random) {
   return random.oneIn(8) ? renamed(name) : name;
 }
 

@@ -92,7 +92,7 @@ class HomeMaking {
 
  private:
   [[nodiscard]] bool isOne(std::size_t count) { return random_ && random_->oneIn(count); }
-  [[nodiscard]] NDString named(NDString name) { return isOne(8) ? renamed(name) : name; }
+  [[nodiscard]] NDString named(const NDString& name) { return isOne(8) ? renamed(name) : name; }
 
   void addRoom(std::size_t room) {
     std::optional<NDUUID> uuid;

@@ -12,6 +12,7 @@ struct ProcessFigures {
   std::size_t threads = 0;
   std::size_t descriptors = 0;
 
+  /// Measures, after free memory was given back to the system.
   [[nodiscard]] static ProcessFigures now();
   /// The figures on one line, for people.
   [[nodiscard]] std::string text() const;
