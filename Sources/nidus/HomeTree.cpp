@@ -5,7 +5,7 @@
 #include <utility>
 #include <vector>
 
-#include "nidus/StandardStreams.h"
+#include "HomePlatform/System/OneLine.h"
 
 namespace nidus {
 namespace {

@@ -15,9 +15,6 @@ namespace nidus {
 /// Writes all of `text` to an open file; false, with the reason in `errno`, when that fails.
 [[nodiscard]] bool writeWhole(int file, std::string_view text);
 
-/// `text` on one line: its control characters are shown as escapes such as "\\x0a".
-[[nodiscard]] std::string onOneLine(std::string_view text);
-
 /// Writes `text` to standard output; success, or the status of the failure, which is reported.
 ExitStatus printText(std::string_view text);
 

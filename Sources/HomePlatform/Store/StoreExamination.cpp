@@ -15,7 +15,7 @@ namespace nidus {
 namespace {
 
 /// The lines of a report of the engine, its heading left out, as one.
-std::string onOneLine(std::string_view report) {
+std::string joinedLines(std::string_view report) {
   std::string line;
   for (std::size_t end = 0; !report.empty();
        report.remove_prefix(std::min(end + 1, report.size()))) {
@@ -64,7 +64,7 @@ class Look {
   void checkIntegrity() {
     Statement row(database_, "PRAGMA integrity_check(10)");
     while (row.step()) {
-      if (row.text(0) != "ok") addDamage(onOneLine(row.text(0)));
+      if (row.text(0) != "ok") addDamage(joinedLines(row.text(0)));
     }
   }
 

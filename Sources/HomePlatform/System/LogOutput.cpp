@@ -11,6 +11,7 @@
 #include <string_view>
 
 #include "HomePlatform/System/FileDescriptor.h"
+#include "HomePlatform/System/OneLine.h"
 
 namespace nidus {
 namespace {
@@ -24,22 +25,6 @@ int levelOf(const NDSystemLogMessage& message) {
   const std::string& level = logField(message, "Level");
   const bool isKnown = level.size() == 1 && level[0] >= '0' && level[0] <= '7';
   return isKnown ? level[0] - '0' : LOG_DEBUG;
-}
-
-void appendEscaped(std::string& out, std::string_view text) {
-  constexpr std::string_view kDigits = "0123456789abcdef";
-  for (const char character : text) {
-    const auto code = static_cast<unsigned char>(character);
-    if (code >= 0x20 && code != 0x7F) {
-      out += character;
-    } else if (character == '\n') {
-      out += "\\n";
-    } else {
-      out += "\\x";
-      out += kDigits[code >> 4U];
-      out += kDigits[code & 0xFU];
-    }
-  }
 }
 
 class StandardErrorLog final : public LogOutput {
@@ -82,10 +67,8 @@ class JournalLog final : public LogOutput {
 class ClassicLog final : public LogOutput {
  public:
   void write(const NDSystemLogMessage& message) override {
-    std::string line;
-    appendEscaped(line, logField(message, "Facility"));
-    line += ": ";
-    appendEscaped(line, logField(message, "Message"));
+    const std::string line =
+        onOneLine(logField(message, "Facility") + ": " + logField(message, "Message"));
     ::syslog(LOG_USER | levelOf(message), "%s", line.c_str());
   }
 };
@@ -113,9 +96,7 @@ const std::string& logField(const NDSystemLogMessage& message, const char* name)
 std::string logLine(const NDSystemLogMessage& message) {
   std::string line(kLevelNames[levelOf(message)]);
   line += " (" + std::to_string(levelOf(message)) + ") ";
-  appendEscaped(line, logField(message, "Facility"));
-  line += ": ";
-  appendEscaped(line, logField(message, "Message"));
+  line += onOneLine(logField(message, "Facility") + ": " + logField(message, "Message"));
   return line + '\n';
 }
 

@@ -2,8 +2,8 @@
 
 #include <utility>
 
+#include "HomePlatform/System/OneLine.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
-#include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {

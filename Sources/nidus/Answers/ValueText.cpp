@@ -6,9 +6,9 @@
 #include <cmath>
 #include <cstdint>
 
+#include "HomePlatform/System/OneLine.h"
 #include "PlatformModel/System/NDNumberText.h"
 #include "nidus/Answers/ReplyForm.h"
-#include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {

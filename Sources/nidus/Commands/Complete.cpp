@@ -2,6 +2,7 @@
 #include <cstddef>
 #include <memory>
 
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/CommandLine.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"

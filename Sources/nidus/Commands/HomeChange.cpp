@@ -2,6 +2,7 @@
 
 #include <optional>
 
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/InterruptionHold.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Workspace.h"

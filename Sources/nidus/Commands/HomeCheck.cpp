@@ -1,5 +1,6 @@
 #include <memory>
 
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/Commands/ExitStatusText.h"

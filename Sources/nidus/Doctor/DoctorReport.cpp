@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "AssistantHost/JsonLine.h"
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/StandardStreams.h"
 
 namespace nidus {

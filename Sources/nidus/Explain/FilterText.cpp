@@ -4,12 +4,12 @@
 #include <array>
 #include <vector>
 
+#include "HomePlatform/System/OneLine.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "nidus/Answers/ReplyForm.h"
 #include "nidus/Explain/NameHint.h"
 #include "nidus/Explain/Records.h"
 #include "nidus/MissingHomes.h"
-#include "nidus/StandardStreams.h"
 #include "nidus/Terminal/TextTable.h"
 
 namespace nidus {

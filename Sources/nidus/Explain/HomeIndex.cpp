@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "nidus/StandardStreams.h"
+#include "HomePlatform/System/OneLine.h"
 
 namespace nidus {
 

@@ -4,9 +4,9 @@
 #include <string_view>
 
 #include "HomePlatform/System/LogOutput.h"
+#include "HomePlatform/System/OneLine.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "nidus/Answers/ReplyForm.h"
-#include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {

@@ -3,11 +3,11 @@
 #include <algorithm>
 #include <string_view>
 
+#include "HomePlatform/System/OneLine.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/System/NDTextMatching.h"
 #include "nidus/Explain/Records.h"
 #include "nidus/Orders/NearMiss.h"
-#include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {

@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <unordered_set>
 
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/Answers/ReplyForm.h"
-#include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {

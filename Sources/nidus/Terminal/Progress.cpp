@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <utility>
 
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/StandardStreams.h"
 #include "nidus/Terminal/Terminal.h"
 

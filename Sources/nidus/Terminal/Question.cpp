@@ -7,6 +7,7 @@
 #include <csignal>
 #include <optional>
 
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/StandardStreams.h"
 
 namespace nidus {

@@ -4,8 +4,8 @@
 #include <string_view>
 
 #include "AssistantHost/JsonLine.h"
+#include "HomePlatform/System/OneLine.h"
 #include "nidus/Answers/ValueText.h"
-#include "nidus/StandardStreams.h"
 
 namespace nidus {
 namespace {

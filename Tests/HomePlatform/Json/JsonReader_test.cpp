@@ -257,8 +257,8 @@ TEST(ReplayJsonTest, StartsPlacesAtItsBase) {
 }
 
 TEST(FailureOfTest, NamesFileAndPlaceOnOneLine) {
-  const Failure failure = failureOf(JsonError{"/a\nb", "expected a text"}, "home.json");
-  EXPECT_EQ(failure.message, "home.json: /a\\x0ab: expected a text");
+  const Failure failure = failureOf(JsonError{"/a\nb\xc2\x9b", "expected a text"}, "home.json");
+  EXPECT_EQ(failure.message, "home.json: /a\\x0ab\\xc2\\x9b: expected a text");
   EXPECT_EQ(failure.kind, Failure::Kind::badInput);
 }
 

@@ -78,8 +78,8 @@ TEST(LogLineTest, NamesLevelAndFacility) {
 }
 
 TEST(LogLineTest, NoTextMakesLines) {
-  EXPECT_EQ(logLine(message("4", "a\nerror (3) x\r\x1b[1m\x7f")),
-            "warning (4) com.corvane.Nidus: a\\nerror (3) x\\x0d\\x1b[1m\\x7f\n");
+  EXPECT_EQ(logLine(message("4", "a\nerror (3) x\r\x1b[1m\x7f\xc2\x9b")),
+            "warning (4) com.corvane.Nidus: a\\x0aerror (3) x\\x0d\\x1b[1m\\x7f\\xc2\\x9b\n");
 }
 
 TEST(LogLineTest, MissingFieldsAreEmpty) {

@@ -1,4 +1,4 @@
-#include "nidus/StandardStreams.h"
+#include "HomePlatform/System/OneLine.h"
 
 #include <gtest/gtest.h>
 
