@@ -4,6 +4,7 @@
 
 #include "HomePlatform/HomePlatform.h"
 #include "HomePlatform/Store/HomeDocument.h"
+#include "Support/DataText.h"
 #include "Support/Finding.h"
 
 namespace nidus {
@@ -42,12 +43,12 @@ std::vector<HomeData> throughDatabase(const std::vector<HomeData>& homes) {
 std::string homeDocumentOf(const std::vector<HomeData>& homes) { return written(homes, true); }
 
 void checkHomesSurvive(const std::vector<HomeData>& homes) {
-  const std::string document = written(homes, true);
-  expectSameText("Homes change when they are written and read", document,
-                 homeDocumentOf(readBack(document)));
-  expectSameText("Homes change when they are written on one line and read", document,
-                 homeDocumentOf(readBack(written(homes, false))));
-  expectSameText("Homes change in the database", document, homeDocumentOf(throughDatabase(homes)));
+  const std::string expected = dataText(homes);
+  expectSameText("Homes change when they are written and read", expected,
+                 dataText(readBack(written(homes, true))));
+  expectSameText("Homes change when they are written on one line and read", expected,
+                 dataText(readBack(written(homes, false))));
+  expectSameText("Homes change in the database", expected, dataText(throughDatabase(homes)));
 }
 
 }  // namespace nidus

@@ -9,8 +9,8 @@
 namespace nidus {
 namespace {
 
-/// What a person can still read, the document's name aside.
-constexpr std::size_t kGreatestLength = 1000;
+/// More than any message has, the document's name aside, be all that it quotes escaped.
+constexpr std::size_t kGreatestLength = 10000;
 
 bool isControl(char32_t codePoint) {
   return codePoint < 0x20 || (codePoint >= 0x7F && codePoint < 0xA0);
