@@ -6,6 +6,7 @@
 #include <fstream>
 
 #include "PlatformModel/System/NDMainQueue.h"
+#include "Support/FileShortage.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
@@ -86,6 +87,18 @@ TEST(FolderWatchFailureTest, NamesTheFolder) {
   const auto started = FolderWatch::start("/nonexistent/folder", {{"watched"}}, [] {});
   ASSERT_FALSE(started);
   EXPECT_THAT(started.failure().message, HasSubstr("/nonexistent/folder"));
+}
+
+TEST(FolderWatchFailureTest, NeedsFilesToBeLeft) {
+  const TestFolder folder;
+  for (const std::size_t spare : {0U, 1U}) {
+    SCOPED_TRACE(spare);
+    const FileShortage shortage(spare);
+    const auto started = FolderWatch::start(folder.path(), {{"watched"}}, [] {});
+    ASSERT_FALSE(started);
+    EXPECT_THAT(started.failure().message,
+                HasSubstr(": changes cannot be watched: Too many open files; end other programs"));
+  }
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 #include <cstring>
 
 #include "HomePlatform/System/FileDescriptor.h"
+#include "Support/FileShortage.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
@@ -124,6 +125,26 @@ TEST_F(JournalTest, TakesLevelFacilityAndText) {
   EXPECT_THAT(datagram, HasSubstr(field("MESSAGE", "two\nlines")));
   EXPECT_THAT(datagram, HasSubstr(field("PRIORITY", "4")));
   EXPECT_THAT(datagram, HasSubstr(field("NIDUS_FACILITY", "com.corvane.Nidus")));
+}
+
+TEST_F(JournalTest, TakesTheLevelOfDebugForNone) {
+  makeSystemLog(path_)->write(NDSystemLogMessage());
+  EXPECT_THAT(receive(), HasSubstr(field("PRIORITY", "7")));
+}
+
+/// The machine may have a log of the older kind, which is then used instead.
+bool isAnOlderLogThere() { return ::access("/dev/log", W_OK) == 0; }
+
+TEST_F(JournalTest, IsOptional) {
+  const std::string tooLong(200, 'x');
+  for (const std::string& path : {folder_.file("missing"), folder_.file(tooLong)}) {
+    EXPECT_EQ(makeSystemLog(path) != nullptr, isAnOlderLogThere()) << path;
+  }
+}
+
+TEST_F(JournalTest, IsLeftOutWhenNoFileIsLeft) {
+  const FileShortage shortage;
+  EXPECT_EQ(makeSystemLog(path_) != nullptr, isAnOlderLogThere());
 }
 
 }  // namespace

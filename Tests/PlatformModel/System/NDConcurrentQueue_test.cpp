@@ -1,12 +1,14 @@
 #include "PlatformModel/System/NDConcurrentQueue.h"
 
 #include <gtest/gtest.h>
+#include <pthread.h>
 
 #include <atomic>
 #include <future>
 #include <latch>
 #include <memory>
 #include <string>
+#include <system_error>
 #include <thread>
 #include <vector>
 
@@ -18,6 +20,58 @@ namespace {
 /// Runs a function when the last copy of it is destroyed, as the captured state of a task is.
 std::shared_ptr<void> whenDestroyed(NDTask task) {
   return {nullptr, [task = std::move(task)](void*) { task(); }};
+}
+
+/// While it lives, the machine has no thread to give: a new one would ask for too large a stack.
+class ThreadShortage {
+ public:
+  ThreadShortage() {
+    pthread_getattr_default_np(&usual_);
+    pthread_attr_t greedy;
+    pthread_getattr_default_np(&greedy);
+    constexpr std::size_t kMoreThanThereIs = std::size_t{1} << 60;
+    pthread_attr_setstacksize(&greedy, kMoreThanThereIs);
+    pthread_setattr_default_np(&greedy);
+    pthread_attr_destroy(&greedy);
+  }
+  ~ThreadShortage() {
+    pthread_setattr_default_np(&usual_);
+    pthread_attr_destroy(&usual_);
+  }
+  ThreadShortage(const ThreadShortage&) = delete;
+  ThreadShortage& operator=(const ThreadShortage&) = delete;
+
+ private:
+  pthread_attr_t usual_{};
+};
+
+TEST(NDConcurrentQueueTest, OneThreadDoesTheWorkOfMore) {
+  NDConcurrentQueue queue(2);
+  std::latch isShort(1);
+  std::vector<int> order;
+  queue.async([&] {
+    isShort.wait();
+    order.push_back(1);
+  });
+  {
+    const ThreadShortage shortage;
+    queue.async([&order] { order.push_back(2); });
+  }
+  isShort.count_down();
+  queue.waitUntilIdle();
+  EXPECT_EQ(order, (std::vector<int>{1, 2}));
+}
+
+TEST(NDConcurrentQueueTest, WithoutAThreadWorkIsRefused) {
+  NDConcurrentQueue queue(2);
+  bool hasRun = false;
+  {
+    const ThreadShortage shortage;
+    EXPECT_THROW(queue.async([&hasRun] { hasRun = true; }), std::system_error);
+  }
+  queue.async([] {});
+  queue.waitUntilIdle();
+  EXPECT_FALSE(hasRun);
 }
 
 TEST(NDConcurrentQueueTest, RunsEachPieceOnce) {

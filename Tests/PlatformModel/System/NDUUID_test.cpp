@@ -5,12 +5,17 @@
 #include <unistd.h>
 
 #include <array>
+#include <cerrno>
+#include <optional>
 #include <set>
 #include <string>
+#include <system_error>
+#include <thread>
 #include <unordered_set>
 #include <vector>
 
 #include "PlatformModel/RunOnThreads.h"
+#include "PlatformModel/Support/FaultyRandomSource.h"
 
 namespace nidus {
 namespace {
@@ -109,6 +114,35 @@ TEST(NDUUIDTest, ForkedProcessMakesOthers) {
   EXPECT_EQ(status, 0);
   close(pipeEnds[0]);
   close(pipeEnds[1]);
+}
+
+/// Makes one on a thread of its own, which has no random bytes left from an earlier one.
+std::optional<NDUUID> randomOfNewThread(std::error_code& failure) {
+  std::optional<NDUUID> made;
+  std::thread([&] {
+    try {
+      made = NDUUID::random();
+    } catch (const std::system_error& error) {
+      failure = error.code();
+    }
+  }).join();
+  return made;
+}
+
+TEST(NDUUIDTest, InterruptedDrawIsMadeAgain) {
+  const FaultyRandomSource source(EINTR, 2);
+  std::error_code failure;
+  const auto made = randomOfNewThread(failure);
+  ASSERT_TRUE(made) << failure.message();
+  EXPECT_EQ(FaultyRandomSource::drawsLeft(), 0);
+  EXPECT_NE(made, randomOfNewThread(failure));
+}
+
+TEST(NDUUIDTest, WithoutRandomBytesNoneIsMade) {
+  const FaultyRandomSource source(ENOSYS, 1);
+  std::error_code failure;
+  EXPECT_FALSE(randomOfNewThread(failure));
+  EXPECT_EQ(failure, std::errc::function_not_supported);
 }
 
 TEST(NDUUIDTest, OrdersByBytes) {

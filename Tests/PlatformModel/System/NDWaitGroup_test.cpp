@@ -114,6 +114,15 @@ TEST_F(NDWaitGroupTest, WaitEndsAtItsDeadline) {
   EXPECT_EQ(clock_->now(), before + 2s);
 }
 
+TEST_F(NDWaitGroupTest, WaitOfNoTimeOnlyAsks) {
+  const auto before = clock_->now();
+  group_->enter();
+  EXPECT_FALSE(group_->wait(0s));
+  group_->leave();
+  EXPECT_TRUE(group_->wait(0s));
+  EXPECT_EQ(clock_->now(), before);
+}
+
 TEST_F(NDWaitGroupTest, LongestWaitEndsWithTime) {
   group_->enter();
   EXPECT_FALSE(group_->wait(NDClock::Duration::max()));
