@@ -34,7 +34,7 @@ Result<Vocabulary> openVocabulary(HomePlatformOptions& options) {
 }
 
 Result<std::shared_ptr<HomeStore>> openStore(HomePlatformOptions& options) {
-  auto store = HomeStore::open(fileOf(options, kDatabaseFile));
+  auto store = HomeStore::open(fileOf(options, kDatabaseFile), options.lockTimeout);
   if (!store) return store.failure();
   const auto homes = std::exchange(options.homes, {});
   if (!options.dataFolder && !homes.empty()) {

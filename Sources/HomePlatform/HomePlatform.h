@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <filesystem>
 #include <functional>
 #include <iosfwd>
@@ -15,6 +16,7 @@
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
 #include "HomePlatform/Store/HomeEdit.h"
+#include "HomePlatform/Store/HomeStore.h"
 #include "HomePlatform/Store/HomeWatch.h"
 #include "HomePlatform/Store/StoreProgress.h"
 #include "PlatformModel/NDPlatform.h"
@@ -33,6 +35,8 @@ struct HomePlatformOptions {
   bool drainsOnCaller = false;
   /// The clock of all waits; null takes the machine's, or, with `drainsOnCaller`, the jumping one.
   std::shared_ptr<NDClock> clock = nullptr;
+  /// How long a change waits for another process that is changing the homes.
+  std::chrono::milliseconds lockTimeout = HomeStore::kLockTimeout;
   /// The metric flag; none takes it from the environment's locale.
   std::optional<bool> metric = std::nullopt;
   /// Homes of a platform in memory, as a home document may hold them.

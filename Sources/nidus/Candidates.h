@@ -21,6 +21,7 @@ enum class CandidateKind {
   groups,
   scenes,
   triggers,
+  backups,  ///< Of the homes, in the data folder.
   files,
 };
 

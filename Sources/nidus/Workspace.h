@@ -26,6 +26,7 @@ class Workspace {
 
   /// What was asked for; read when a command runs.
   [[nodiscard]] Settings& settings() noexcept { return settings_; }
+  [[nodiscard]] const Settings& settings() const noexcept { return settings_; }
 
   /// The session with its platform; never null, valid as long as this. The device is locked or not
   /// as the settings say now.

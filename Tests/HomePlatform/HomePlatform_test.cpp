@@ -9,6 +9,7 @@
 #include <thread>
 
 #include "HomePlatform/PlatformProbe.h"
+#include "HomePlatform/Store/Database.h"
 #include "PlatformModel/System/NDDeliveryHold.h"
 #include "PlatformModel/System/NDWaitGroup.h"
 #include "Support/TestFolder.h"
@@ -238,6 +239,21 @@ TEST(HomePlatformTest, ReportsNoHomesWhenDatabaseFails) {
   EXPECT_TRUE(platform.homes().empty());
   ASSERT_EQ(failures.size(), 1U);
   EXPECT_THAT(failures[0], HasSubstr("home.db"));
+}
+
+TEST(HomePlatformTest, ChangeEndsWithTheLockTimeout) {
+  const TestFolder folder;
+  auto options = inFolder(folder);
+  options.lockTimeout = std::chrono::milliseconds(1);
+  const OpenPlatform platform(options);
+  ASSERT_FALSE(platform->importHomes({sampleHome()}, false));
+  Database other(folder.file("data/home.db"), std::chrono::milliseconds(0));
+  other.run("BEGIN IMMEDIATE");
+  const Status failure = platform->importHomes({}, false);
+  ASSERT_TRUE(failure);
+  EXPECT_THAT(failure->message, HasSubstr("home.db: the database is locked"));
+  other.run("ROLLBACK");
+  EXPECT_EQ(platform->exportHomes()->size(), 1U);
 }
 
 bool isConfigured(HomePlatform& platform) {

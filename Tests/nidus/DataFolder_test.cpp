@@ -139,18 +139,6 @@ TEST_F(DataFolderTest, FailsWithANewerDatabase) {
   expectPlatformFailure(database() + ": ");
 }
 
-TEST_F(DataFolderTest, FailsToChangeALockedDatabase) {
-  importSmallHome();
-  Connection other(database());
-  other.run("BEGIN EXCLUSIVE");
-  const auto file = folder_.write("b.json", documentOf({emptyHome("Other", 2)}));
-  const ProgramEnd end = run({"home", "import", file});
-  EXPECT_EQ(end.exitStatus, 4);
-  EXPECT_THAT(end.errors, IsOneFailure(database() + ": "));
-  other.run("ROLLBACK");
-  EXPECT_THAT(exported(), HasSubstr("Cottage"));
-}
-
 TEST_F(DataFolderTest, MayFailWhileTheProgramRuns) {
   importSmallHome();
   ProgramProcess process(start({"perform"}));

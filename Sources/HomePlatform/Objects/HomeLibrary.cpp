@@ -20,14 +20,16 @@ Result<std::shared_ptr<const HomeEdition>> HomeLibrary::current() {
 }
 
 Status HomeLibrary::keep(const std::vector<ValueChange>& changes) {
-  const NDLock lock(mutex_);
-  if (Status failure = store_->writeValues(changes)) return failure;
-  for (const auto& weak : inUse_) {
-    const auto home = weak.lock();
-    if (!home) continue;
-    for (const ValueChange& change : changes) home->apply(change);
-  }
-  return std::nullopt;
+  return store_->writeValues(changes, [this, &changes](const std::function<Status()>& write) {
+    const NDLock lock(mutex_);
+    if (Status failure = write()) return failure;
+    for (const auto& weak : inUse_) {
+      const auto home = weak.lock();
+      if (!home) continue;
+      for (const ValueChange& change : changes) home->apply(change);
+    }
+    return Status();
+  });
 }
 
 /// `version` was read before, so that a change in between is seen as one the next time.

@@ -37,8 +37,9 @@ class HomeLibrary final : public ValueKeeper {
   void bringEarlierHomesUpToDate() ND_REQUIRES(mutex_);
 
   const std::shared_ptr<HomeStore> store_;
-  /// Also held while the database is read or written: what is loaded must not miss what is kept at
-  /// the same time.
+  /// Also held while the database is read or a write is committed: what is loaded must not miss
+  /// what is kept at the same time. Not while a write waits for another process, so that homes are
+  /// delivered meanwhile.
   NDMutex mutex_;
   std::weak_ptr<HomeCalls> calls_ ND_GUARDED_BY(mutex_);
   std::shared_ptr<const HomeEdition> current_ ND_GUARDED_BY(mutex_);

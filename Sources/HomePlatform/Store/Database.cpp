@@ -90,8 +90,11 @@ void Database::fail(int code) const {
 
 Statement::Statement(Database& database, const char* statement) : database_(database) {
   constexpr unsigned kFlags = 0;
-  database_.check(
-      sqlite3_prepare_v3(database_.connection_, statement, -1, kFlags, &statement_, nullptr));
+  const int code =
+      sqlite3_prepare_v3(database_.connection_, statement, -1, kFlags, &statement_, nullptr);
+  // The statements are right, so it is the tables that are not.
+  if (code == SQLITE_ERROR) database_.fail(SQLITE_CORRUPT);
+  database_.check(code);
 }
 
 Statement::~Statement() { sqlite3_finalize(statement_); }

@@ -49,4 +49,10 @@ Status prepareDatabaseFile(const fs::path& file) {
                  "give yourself write permission on the file");
 }
 
+void removeDatabaseFile(const fs::path& file) {
+  for (const char* suffix : {"", "-journal", "-wal", "-shm"}) {
+    ::unlink((file.string() + suffix).c_str());
+  }
+}
+
 }  // namespace nidus

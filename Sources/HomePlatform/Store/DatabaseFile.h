@@ -10,4 +10,7 @@ namespace nidus {
 /// and checks that both may be written. Gives none when all is well.
 [[nodiscard]] Status prepareDatabaseFile(const std::filesystem::path& file);
 
+/// Removes `file`, if it is there, and what the engine keeps beside it. Nobody may be using it.
+void removeDatabaseFile(const std::filesystem::path& file);
+
 }  // namespace nidus

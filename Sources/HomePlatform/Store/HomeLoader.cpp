@@ -4,6 +4,7 @@
 #include <unordered_map>
 #include <utility>
 
+#include "HomePlatform/Store/Schema.h"
 #include "HomePlatform/Store/SharedTexts.h"
 
 namespace nidus {
@@ -239,5 +240,13 @@ class HomeLoader {
 }  // namespace
 
 std::vector<HomeData> loadHomesFrom(Database& database) { return HomeLoader(database).load(); }
+
+std::vector<HomeData> loadMigratedHomes(Database& database) {
+  const bool isCurrent = isSchemaCurrent(database, schemaSteps());
+  const Transaction undone(database,
+                           isCurrent ? Transaction::Kind::reading : Transaction::Kind::writing);
+  if (!isCurrent) runSchemaSteps(database, schemaSteps());
+  return loadHomesFrom(database);
+}
 
 }  // namespace nidus

@@ -11,4 +11,8 @@ namespace nidus {
 /// `DatabaseError`.
 [[nodiscard]] std::vector<HomeData> loadHomesFrom(Database& database);
 
+/// The same for a database that may have an earlier version: as the homes would be after its
+/// migration, which is not made. Not within a transaction.
+[[nodiscard]] std::vector<HomeData> loadMigratedHomes(Database& database);
+
 }  // namespace nidus

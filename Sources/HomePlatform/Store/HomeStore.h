@@ -3,6 +3,7 @@
 #include <chrono>
 #include <cstdint>
 #include <filesystem>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <utility>
@@ -23,10 +24,20 @@ struct ValueChange {
   std::optional<NDValueRef> deviceValue;  ///< The new device value; none leaves it.
 };
 
+/// Calls `write`, which writes values and makes them lasting, in the midst of what has to be done
+/// at the same moment. Nobody else can write meanwhile.
+using AroundWrite = std::function<Status(const std::function<Status()>& write)>;
+
 /// The home database: one SQLite file, or one in memory.
 ///
 /// May be used from any thread and by several processes; every change is one transaction that is
-/// on disk when the call returns. A failure's message names the file and the remedy.
+/// on disk when the call returns. What only reads does not wait for a change that another process
+/// is making, not even when a change of this one does. A failure's message names the file and the
+/// remedy.
+///
+/// Before the homes are replaced or merged, or an earlier schema is migrated, a backup of the homes
+/// that there are is kept beside the file, and the last `kBackupsKept` of them stay. An edit, which
+/// is small and frequent, makes none: it would push out those that matter.
 class HomeStore {
  public:
   /// How long a call waits for another process that is changing the database.
@@ -55,8 +66,11 @@ class HomeStore {
   /// Reads all homes in order, within one transaction.
   [[nodiscard]] virtual Result<std::vector<HomeData>> loadHomes() = 0;
   [[nodiscard]] virtual Result<std::int64_t> countHomes() = 0;
-  /// Writes all of `changes`, or none; an address that is no longer there is passed over.
-  [[nodiscard]] virtual Status writeValues(const std::vector<ValueChange>& changes) = 0;
+  /// Writes all of `changes`, or none; an address that is no longer there is passed over. `around`,
+  /// which may be empty, is called once it is this process's turn to write, and gives what is
+  /// given back; it must not change the store.
+  [[nodiscard]] virtual Status writeValues(const std::vector<ValueChange>& changes,
+                                           const AroundWrite& around = nullptr) = 0;
   /// A number that differs after each change of the database by another connection or process, and
   /// after each `replaceHomes`, `mergeHomes` and `editHomes` of this one; `writeValues` of this one
   /// keeps it.

@@ -179,12 +179,17 @@ void runSchemaSteps(Database& database, const std::vector<std::string>& steps) {
   database.run("PRAGMA user_version = " + std::to_string(steps.size()));
 }
 
-std::optional<SchemaProblem> applySchema(Database& database,
-                                         const std::vector<std::string>& steps) {
+std::optional<SchemaProblem> applySchema(Database& database, const std::vector<std::string>& steps,
+                                         const MigrationHooks& hooks) {
   if (isSchemaCurrent(database, steps)) return std::nullopt;  // nearly always, and without a lock
   Transaction transaction(database, Transaction::Kind::writing);
+  // Another process may have been the first.
+  if (isSchemaCurrent(database, steps)) return std::nullopt;
   if (const auto problem = schemaProblemOf(database, steps)) return problem;
+  const bool isMigration = !isEmpty(database);
+  if (isMigration && hooks.before) hooks.before();
   runSchemaSteps(database, steps);
+  if (isMigration && hooks.beforeCommit) hooks.beforeCommit();
   transaction.commit();
   return std::nullopt;
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -34,9 +35,16 @@ enum class SchemaProblem {
 /// when there is no problem. Throws `DatabaseError`.
 void runSchemaSteps(Database& database, const std::vector<std::string>& steps);
 
+/// What goes with a migration, within its transaction; either may be empty.
+struct MigrationHooks {
+  std::function<void()> before = nullptr;        ///< Before a database with contents is changed.
+  std::function<void()> beforeCommit = nullptr;  ///< When that is done, before it is lasting.
+};
+
 /// Brings `database` to the version that `steps` lead to, in one transaction; several processes may
 /// do so at the same time. Gives what is in the way, none when it is done. Throws `DatabaseError`.
 [[nodiscard]] std::optional<SchemaProblem> applySchema(Database& database,
-                                                       const std::vector<std::string>& steps);
+                                                       const std::vector<std::string>& steps,
+                                                       const MigrationHooks& hooks = {});
 
 }  // namespace nidus

@@ -1,5 +1,7 @@
 #include "HomePlatform/Store/StoreFailures.h"
 
+#include "HomePlatform/Store/BackupList.h"
+
 namespace nidus {
 namespace {
 
@@ -7,20 +9,18 @@ Failure failure(const std::string& name, const std::string& problem, const std::
   return {Failure::Kind::platform, name + ": " + problem + "; " + remedy};
 }
 
-}  // namespace
-
-Failure failureOf(const DatabaseError& error, const std::string& name) {
+/// What is wrong, and the remedy where it is the same for all databases.
+Failure failureOf(const DatabaseError& error, const std::string& name,
+                  const std::string& remedyOfDamage) {
   const std::string cause = " (" + error.message + ")";
   switch (error.kind) {
     case DatabaseError::Kind::locked:
       return failure(name, "the database is locked: another process is using it" + cause,
                      "try again when that one has finished");
     case DatabaseError::Kind::damaged:
-      return failure(name, "the database is damaged" + cause,
-                     "restore it from a backup, or move it away and import the homes again");
+      return failure(name, "the database is damaged" + cause, remedyOfDamage);
     case DatabaseError::Kind::notADatabase:
-      return failure(name, "the file is damaged or no database" + cause,
-                     "restore it from a backup, or move it away and import the homes again");
+      return failure(name, "the file is damaged or no database" + cause, remedyOfDamage);
     case DatabaseError::Kind::notWritable:
       return failure(name, "the database cannot be opened for writing" + cause,
                      "give yourself write permission on the file and its folder");
@@ -32,12 +32,37 @@ Failure failureOf(const DatabaseError& error, const std::string& name) {
   return failure(name, "the database failed" + cause, "check the disk and try again");
 }
 
-Failure failureOf(SchemaProblem problem, const std::string& name) {
+std::string remedyOfDamage(const std::filesystem::path& file) {
+  const auto backup = newestGoodBackupOf(file);
+  if (!backup) {
+    return "there is no good backup of it, so move it away and import the homes again";
+  }
+  return "nidus home restore brings back " + backup->filename().string() +
+         ", its newest good backup";
+}
+
+}  // namespace
+
+bool isDamage(const DatabaseError& error) {
+  return error.kind == DatabaseError::Kind::damaged ||
+         error.kind == DatabaseError::Kind::notADatabase;
+}
+
+Failure failureOf(const DatabaseError& error, const std::filesystem::path& file) {
+  return failureOf(error, file.string(), isDamage(error) ? remedyOfDamage(file) : "");
+}
+
+Failure failureOf(SchemaProblem problem, const std::filesystem::path& file) {
   if (problem == SchemaProblem::newer) {
-    return failure(name, "the database was written by a newer version of this program",
+    return failure(file.string(), "the database was written by a newer version of this program",
                    "use that version, or another data folder");
   }
-  return failure(name, "the file is a database of another program", "use another data folder");
+  return failure(file.string(), "the file is a database of another program",
+                 "use another data folder");
+}
+
+Failure failureInMemory(const DatabaseError& error) {
+  return failureOf(error, "the database in memory", "start again");
 }
 
 }  // namespace nidus

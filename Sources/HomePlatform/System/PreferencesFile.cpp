@@ -11,6 +11,7 @@
 
 #include "HomePlatform/Json/JsonText.h"
 #include "HomePlatform/System/FileDescriptor.h"
+#include "HomePlatform/System/FilePlacing.h"
 
 namespace nidus {
 namespace {
@@ -61,23 +62,13 @@ bool writeAll(int file, std::string_view text) {
   return true;
 }
 
-void syncFolder(const std::filesystem::path& folder) {
-  const FileDescriptor opened(::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-  if (opened) ::fsync(opened.get());
-}
-
 /// Writes `text` beside the file and puts it in its place; 0 or the error.
 int replaceFile(const std::filesystem::path& path, std::string_view text) {
   std::string temporary = path.string() + ".XXXXXX";
   const FileDescriptor file(::mkostemp(temporary.data(), O_CLOEXEC));  // owner-only from the start
   if (!file) return errno;
-  if (writeAll(file.get(), text) && ::fsync(file.get()) == 0 &&
-      ::rename(temporary.c_str(), path.c_str()) == 0) {
-    syncFolder(path.parent_path());
-    return 0;
-  }
-  const int error = errno;
-  ::unlink(temporary.c_str());
+  const int error = writeAll(file.get(), text) ? putInPlace(temporary, path) : errno;
+  if (error != 0) ::unlink(temporary.c_str());
   return error;
 }
 

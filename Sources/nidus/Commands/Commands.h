@@ -17,6 +17,7 @@ void declareHomeRename(CommandSyntax& home, Workspace& workspace);
 void declareHomeMove(CommandSyntax& home, Workspace& workspace);
 void declareHomeRemove(CommandSyntax& home, Workspace& workspace);
 void declareHomeEdit(CommandSyntax& home, Workspace& workspace);
+void declareHomeRestore(CommandSyntax& home, Workspace& workspace);
 void declareOrders(CommandSyntax& program, Workspace& workspace);
 void declarePerform(CommandSyntax& program, Workspace& workspace);
 void declareSync(CommandSyntax& program, Workspace& workspace);

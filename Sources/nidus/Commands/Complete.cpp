@@ -2,6 +2,8 @@
 #include <cstddef>
 #include <memory>
 
+#include "HomePlatform/Store/BackupList.h"
+#include "HomePlatform/System/DataFolder.h"
 #include "HomePlatform/System/OneLine.h"
 #include "nidus/CommandLine.h"
 #include "nidus/CommandSyntax.h"
@@ -22,12 +24,23 @@ struct Request {
   bool isTyped = false;
 };
 
+/// The backups of the data folder, which are wanted most when its homes cannot be read.
+std::vector<HomeName> backupNames(const Workspace& workspace) {
+  std::vector<HomeName> names;
+  const auto folder = dataFolderOf(workspace.settings());
+  if (!folder) return names;
+  for (const auto& backup : backupsOf(*folder / kDatabaseFile)) {
+    names.push_back({CandidateKind::backups, backup.filename().string(), {}});
+  }
+  return names;
+}
+
 /// The names are those of the data folder, if it has a database; without one nothing is made.
 Result<Completion> completeAt(const std::vector<std::string>& words, Workspace& workspace) {
   CommandOutline program;
   declareProgram(program, workspace);
   const CompletionPoint point = completionPointOf(program, words);
-  if (!needsHome(point)) return completionAt(point, {}, {});
+  if (!needsHome(point)) return completionAt(point, backupNames(workspace), {});
   HomePlatformOptions options;
   options.drainsOnCaller = true;
   const auto folder = dataFolderOf(workspace.settings());

@@ -19,6 +19,7 @@ void declareHome(CommandSyntax& program, Workspace& workspace) {
   declareHomeMove(home, workspace);
   declareHomeRemove(home, workspace);
   declareHomeEdit(home, workspace);
+  declareHomeRestore(home, workspace);
 }
 
 }  // namespace nidus

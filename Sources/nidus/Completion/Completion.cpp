@@ -85,7 +85,8 @@ class Gathering {
 
   void addNames(CandidateKind kind) {
     for (const HomeName& name : names_) {
-      const bool isInHome = kind == CandidateKind::homes || point_.home.empty() ||
+      const bool isInHome = kind == CandidateKind::homes || kind == CandidateKind::backups ||
+                            point_.home.empty() ||
                             isEqualIgnoringDiacritics(name.home, point_.home);
       if (name.kind == kind && isInHome) addText(name.name);
     }
@@ -113,7 +114,8 @@ std::vector<std::string> selected(const std::vector<std::string>& texts, const M
 
 bool needsHome(const CompletionPoint& point) {
   return std::any_of(point.kinds.begin(), point.kinds.end(), [](CandidateKind kind) {
-    return kind != CandidateKind::files && kind != CandidateKind::entityTypes;
+    return kind != CandidateKind::files && kind != CandidateKind::entityTypes &&
+           kind != CandidateKind::backups;
   });
 }
 

@@ -10,9 +10,9 @@
 
 namespace nidus {
 
-/// The name of a thing of a home.
+/// The name of a thing of a home, or of the data folder, which is in no home.
 struct HomeName {
-  CandidateKind kind = CandidateKind::homes;  ///< One of homes, rooms, zones, groups and so on.
+  CandidateKind kind = CandidateKind::homes;  ///< One of homes, rooms, zones, backups and so on.
   std::string name;                           ///< Not empty.
   std::string home;                           ///< The name of the home that it is in.
 };

@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "HomePlatform/Metadata/VocabularyReader.h"
+#include "HomePlatform/Store/BackupList.h"
 #include "HomePlatform/Store/StoreExamination.h"
 #include "HomePlatform/System/DataFolder.h"
 #include "HomePlatform/System/Preferences.h"
@@ -34,9 +35,18 @@ void readDatabase(Examination& examination) {
   std::error_code ignored;
   examination.hasDatabase = std::filesystem::exists(file, ignored);
   if (!examination.hasDatabase) return;
+  // Nobody replaces the file by a backup while it is open here.
+  const auto lock = FolderLock::take(examination.folder);
   StoreExamination store = examineStore(file, kPatience);
   examination.databaseFailures = std::move(store.failures);
   examination.homes = std::move(store.homes);
+}
+
+void readBackups(Examination& examination) {
+  for (auto& backup : backupsOf(examination.folder / kDatabaseFile)) {
+    (homesOfBackup(backup) ? examination.backups : examination.badBackups)
+        .push_back(std::move(backup));
+  }
 }
 
 void readVocabulary(Examination& examination) {
@@ -68,6 +78,7 @@ Examination examine(const std::filesystem::path& folder) {
   examination.folderFailure = failureOf(folder);
   if (examination.folderFailure) return examination;
   readDatabase(examination);
+  readBackups(examination);
   readVocabulary(examination);
   readPreferences(examination);
   return examination;

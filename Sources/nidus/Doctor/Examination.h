@@ -17,8 +17,10 @@ struct Examination {
   std::filesystem::path folder;  ///< The data folder, which may be missing.
   /// Why no files can be kept there: then none is looked for, and there is nothing to say of them.
   Status folderFailure;
-  bool hasDatabase = false;               ///< Whether there is a database file.
-  std::vector<Failure> databaseFailures;  ///< What is wrong with it.
+  bool hasDatabase = false;                       ///< Whether there is a database file.
+  std::vector<Failure> databaseFailures;          ///< What is wrong with it.
+  std::vector<std::filesystem::path> backups;     ///< Those of it that are good, newest first.
+  std::vector<std::filesystem::path> badBackups;  ///< The others.
   /// The homes of the database; none when there is none or it cannot be read.
   std::optional<std::vector<HomeData>> homes;
   Status moduleFailure;

@@ -34,12 +34,15 @@ class ScriptedStore final : public HomeStore {
     return homes;
   }
   Result<std::int64_t> countHomes() override { return static_cast<std::int64_t>(homes.size()); }
-  Status writeValues(const std::vector<ValueChange>& changes) override {
+  Status writeValues(const std::vector<ValueChange>& changes, const AroundWrite& around) override {
     ++writes;
     if (isReadOnly) return kBroken;
-    written = changes;
-    if (onWrite) onWrite();
-    return std::nullopt;
+    if (onWait) onWait();
+    return around([&] {
+      written = changes;
+      if (onWrite) onWrite();
+      return Status();
+    });
   }
   Result<bool> waitForWriter() override { return true; }
   Result<std::uint64_t> version() override {
@@ -54,6 +57,7 @@ class ScriptedStore final : public HomeStore {
   bool isBroken = false;
   bool isReadOnly = false;
   std::vector<ValueChange> written;
+  std::function<void()> onWait;
   std::function<void()> onWrite;
 };
 
@@ -116,6 +120,14 @@ TEST_F(HomeLibraryTest, FailedWriteChangesNoValue) {
   const NDValueRef on = NDValue::boolean(true);
   EXPECT_TRUE(library_->keep({{uuidOf(kHomeID), powerAddress(), on, on}}));
   EXPECT_EQ(power(loaded), "0");
+}
+
+TEST_F(HomeLibraryTest, DeliversWhileAWriteWaits) {
+  bool isDelivered = false;
+  store_->onWait = [&] { isDelivered = static_cast<bool>(library_->current()); };
+  const NDValueRef on = NDValue::boolean(true);
+  EXPECT_FALSE(library_->keep({{uuidOf(kHomeID), powerAddress(), on, on}}));
+  EXPECT_TRUE(isDelivered);
 }
 
 TEST_F(HomeLibraryTest, PassesOnFailureOfDatabase) {

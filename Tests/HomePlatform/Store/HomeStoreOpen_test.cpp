@@ -82,7 +82,7 @@ TEST_F(OpenHomeStoreTest, SaysWhenTheFileIsNoDatabase) {
       "a shopping list, and longer than a header of a database is, all in all; "
       "milk, bread, butter, cheese, and six eggs");
   EXPECT_THAT(problem(), StartsWith(file().string() + ": the file is damaged or no database"));
-  EXPECT_THAT(problem(), HasSubstr("restore it from a backup"));
+  EXPECT_THAT(problem(), HasSubstr("; there is no good backup of it"));
   EXPECT_THAT(readFile(), StartsWith("a shopping list"));
 }
 

@@ -359,6 +359,35 @@ TEST_F(HomeStoreTest, ReadsWhileAnotherWrites) {
   EXPECT_EQ(contents(*store), documentOf({lampHome()}));
 }
 
+TEST_F(HomeStoreTest, ReadsWhileItsOwnChangeIsMade) {
+  auto store = open();
+  ASSERT_FALSE(store->replaceHomes({lampHome()}));
+  std::string seen;
+  ASSERT_FALSE(store->editHomes([&](std::vector<HomeData>& homes) {
+    homes.clear();
+    std::thread([&] { seen = store->version() ? contents(*store) : "no version"; }).join();
+    return Status();
+  }));
+  EXPECT_EQ(seen, documentOf({lampHome()}));
+}
+
+TEST_F(HomeStoreTest, OwnWriteHidesNoOtherChange) {
+  auto store = open();
+  auto other = open();
+  ASSERT_FALSE(store->replaceHomes({lampHome()}));
+  const std::uint64_t before = *store->version();
+  ASSERT_FALSE(other->writeValues({change(9, NDValue::integer(1))}));
+  ASSERT_FALSE(store->writeValues({change(10, NDValue::integer(2))}));
+  const std::uint64_t between = *store->version();
+  EXPECT_NE(between, before);
+  const auto andAnother = [&](const std::function<Status()>& write) {
+    const Status failure = write();
+    return failure ? failure : other->writeValues({change(9, NDValue::integer(3))});
+  };
+  ASSERT_FALSE(store->writeValues({change(10, NDValue::integer(4))}, andAnother));
+  EXPECT_NE(*store->version(), between);
+}
+
 TEST_F(HomeStoreTest, SaysWhenAnotherHoldsTheLock) {
   auto store = HomeStore::open(file(), std::chrono::milliseconds(1));
   ASSERT_TRUE(store);

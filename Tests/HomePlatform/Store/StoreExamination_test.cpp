@@ -87,7 +87,8 @@ TEST_F(StoreExaminationTest, FindsDamagedPages) {
   const std::size_t end = content.size();
   content.replace(end - 4096, 4096, 4096, '\xff');
   folder_.write("home.db", content);
-  EXPECT_THAT(problem(), AllOf(HasSubstr("damaged (Page "), HasSubstr("restore it from a backup")));
+  EXPECT_THAT(problem(),
+              AllOf(HasSubstr("damaged (Page "), HasSubstr("; there is no good backup of it")));
 }
 
 TEST_F(StoreExaminationTest, FindsMissingTables) {

@@ -1,18 +1,25 @@
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <functional>
 #include <string>
 
+#include "HomePlatform/HomeRestoration.h"
 #include "HomePlatform/PlatformProbe.h"
 #include "HomePlatform/SampleHome.h"
+#include "HomePlatform/Store/BackupList.h"
 #include "HomePlatform/Store/Database.h"
 #include "HomePlatform/Store/HomeStore.h"
+#include "HomePlatform/Store/NumberedFiles.h"
 #include "HomePlatform/Store/Schema.h"
+#include "HomePlatform/Store/StoreBackup.h"
 #include "HomePlatform/Support/RandomHome.h"
 #include "Support/FaultyDisk.h"
 #include "Support/FaultyMemory.h"
+#include "Support/ReportedCount.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
@@ -49,6 +56,7 @@ struct Change {
   /// Opens the database and changes it; gives whether it was answered as done.
   std::function<bool(const fs::path& folder)> make;
   std::function<std::string(const fs::path& folder)> contents = homesIn;
+  std::size_t copies = 0;  ///< How many backups and databases moved aside there are after it.
 };
 
 void PrintTo(const Change& change, std::ostream* out) { *out << change.name; }
@@ -130,8 +138,9 @@ std::vector<std::string> stepsWithMigration() {
 
 bool migrate(const fs::path& folder) {
   try {
-    Database database(databaseIn(folder), kNoWaiting);
-    return !applySchema(database, stepsWithMigration());
+    const std::string file = databaseIn(folder);
+    Database database(file, kNoWaiting);
+    return !migrateStore(database, file, stepsWithMigration(), kNoWaiting);
   } catch (const DatabaseError&) {
     return false;
   }
@@ -147,15 +156,53 @@ std::string migratedContents(const fs::path& folder) {
          ' ' + std::string(names.text(0));
 }
 
+constexpr const char* kDamaged = "damaged";
+
+/// The homes of each backup, the newest first.
+std::vector<std::string> backupsIn(const fs::path& folder) {
+  std::vector<std::string> states;
+  for (const fs::path& backup : backupsOf(databaseIn(folder))) {
+    const auto homes = homesOfBackup(backup);
+    states.push_back(homes ? documentOf(*homes) : kDamaged);
+  }
+  return states;
+}
+
+void beginWithBackup(const fs::path& folder) {
+  beginWithHome(folder);
+  const auto store = HomeStore::open(databaseIn(folder));
+  ASSERT_FALSE(importRandomHomes(**store));
+}
+
+const std::string& damagedBytes() {
+  static const std::string bytes(8192, 'x');
+  return bytes;
+}
+
+void beginWithDamage(const fs::path& folder) {
+  beginWithBackup(folder);
+  std::ofstream(databaseIn(folder)) << damagedBytes();
+}
+
+bool restore(const fs::path& folder) {
+  return static_cast<bool>(restoreHomes(folder, backupsOf(databaseIn(folder)).front(), kNoWaiting));
+}
+
+std::string damagedOrHomesIn(const fs::path& folder) {
+  return contentOfFile(databaseIn(folder)) == damagedBytes() ? kDamaged : homesIn(folder);
+}
+
 const Change kChanges[] = {
     {"creation", nullptr, withStore([](HomeStore& /*store*/) { return std::nullopt; })},
     {"firstImport", nullptr, withStore(importRandomHomes)},
-    {"import", beginWithHome, withStore(importRandomHomes)},
-    {"merge", beginWithHome, withStore(mergeRandomHome)},
+    {"import", beginWithHome, withStore(importRandomHomes), homesIn, 1},
+    {"merge", beginWithHome, withStore(mergeRandomHome), homesIn, 1},
     {"edit", beginWithHome, withStore(renameTheHome)},
     {"write", beginWithHome, withStore(writeTwoValues)},
     {"scene", beginWithHome, runScene},
-    {"migration", beginWithHome, migrate, migratedContents},
+    {"migration", beginWithHome, migrate, migratedContents, 1},
+    {"restoration", beginWithBackup, restore, homesIn, 2},
+    {"restorationOfDamaged", beginWithDamage, restore, damagedOrHomesIn, 2},
 };
 
 /// One change, made in folders of its own with one fault after the other.
@@ -165,6 +212,8 @@ class StoreFaultTest : public testing::TestWithParam<Change> {
     const TestFolder folder;
     begin(folder);
     before_ = GetParam().contents(folder.path());
+    statesBefore_ = backupsIn(folder.path());
+    statesBefore_.push_back(homesIn(folder.path()));
   }
 
   /// What the change leads to without faults.
@@ -182,10 +231,11 @@ class StoreFaultTest : public testing::TestWithParam<Change> {
     arm();
     const bool isDone = GetParam().make(folder.path());
     const bool wasMet = disarm();
-    EXPECT_EQ(integrityOf(folder.path()), "ok");
     const std::string contents = GetParam().contents(folder.path());
+    EXPECT_TRUE(contents == kDamaged || integrityOf(folder.path()) == "ok");
     EXPECT_TRUE(contents == after_ || (!isDone && contents == before_)) << contents;
     EXPECT_TRUE(isDone || wasMet);
+    checkBackups(folder.path(), contents == after_);
     return wasMet;
   }
 
@@ -194,7 +244,20 @@ class StoreFaultTest : public testing::TestWithParam<Change> {
     if (GetParam().begin) GetParam().begin(folder.path());
   }
 
+  /// Each backup holds a whole state of before, and a change that was made has kept what it
+  /// replaced. Where a fault looks like damage, a restoration keeps it as a damaged database.
+  void checkBackups(const fs::path& folder, bool isChanged) const {
+    const std::vector<std::string> backups = backupsIn(folder);
+    for (const std::string& backup : backups) {
+      EXPECT_THAT(statesBefore_, testing::Contains(backup));
+    }
+    const std::size_t aside = numberedFiles(databaseIn(folder), "damaged").size();
+    EXPECT_TRUE(!isChanged || backups.size() + aside == GetParam().copies)
+        << backups.size() << " backups, " << aside << " moved aside";
+  }
+
   std::string before_;
+  std::vector<std::string> statesBefore_;  ///< Of the database and of its backups.
   std::string after_;
 };
 
@@ -213,36 +276,40 @@ std::int64_t countFaults(std::int64_t stride, const std::function<bool(std::int6
   return faults;
 }
 
-/// Lets every call to the disk fail in turn, once and for ever, while `isMet` does its work between
+/// The long form tries each fault, the short one some of them.
+std::int64_t strideOf(std::int64_t shortStride) {
+  return std::getenv("NIDUS_EVERY_FAULT") ? 1 : shortStride;
+}
+
+/// Lets the calls to the disk fail in turn, once and for ever, while `isMet` does its work between
 /// the two functions it is given.
 using Attempt =
     std::function<bool(const std::function<void()>& arm, const std::function<bool()>& disarm)>;
 
 void failDisk(FaultyDisk::Kind kind, const Attempt& isMet) {
+  constexpr std::int64_t kShortStride = 5;
   FaultyDisk disk;
   std::int64_t faults = 0;
   for (const bool lasts : {false, true}) {
-    faults += countFaults(1, [&](std::int64_t number) {
+    faults += countFaults(strideOf(kShortStride), [&](std::int64_t number) {
       return isMet([&] { disk.arm({kind, number, lasts}); }, [&] { return disk.disarm(); });
     });
   }
-  testing::Test::RecordProperty("faults", std::to_string(faults));
+  reportCount("faults", faults);
 }
 
-/// The same for memory. There are many allocations: all of them fail in the long form alone, the
-/// short one tries some of them.
+/// The same for memory.
 void failMemory(const Attempt& isMet) {
-  constexpr std::int64_t kShortStride = 23;
-  const std::int64_t stride = std::getenv("NIDUS_EVERY_FAULT") ? 1 : kShortStride;
+  constexpr std::int64_t kShortStride = 97;
   FaultyMemory memory;
   const FaultyDisk fasterDisk;
   std::int64_t faults = 0;
   for (const bool lasts : {false, true}) {
-    faults += countFaults(stride, [&](std::int64_t number) {
+    faults += countFaults(strideOf(kShortStride), [&](std::int64_t number) {
       return isMet([&] { memory.arm({number, lasts}); }, [&] { return memory.disarm(); });
     });
   }
-  testing::Test::RecordProperty("faults", std::to_string(faults));
+  reportCount("faults", faults);
 }
 
 TEST_P(StoreFaultTest, SurvivesEachFailingCall) {

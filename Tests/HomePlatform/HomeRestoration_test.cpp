@@ -1,0 +1,156 @@
+#include "HomePlatform/HomeRestoration.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+
+#include "HomePlatform/SampleHome.h"
+#include "HomePlatform/Store/BackupList.h"
+#include "HomePlatform/Store/DamagedStore.h"
+#include "HomePlatform/Store/Database.h"
+#include "HomePlatform/System/Preferences.h"
+#include "Support/TestFolder.h"
+
+namespace nidus {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::HasSubstr;
+
+constexpr std::chrono::milliseconds kNoWaiting{0};
+
+/// A data folder with homes named "Second" and a backup of homes named "First".
+class HomeRestorationTest : public testing::Test {
+ protected:
+  void SetUp() override {
+    const auto store = open();
+    for (const char* name : {"First", "Second"}) {
+      HomeData home = sampleHome();
+      home.name = name;
+      ASSERT_FALSE(store->replaceHomes({home}));
+    }
+    backup_ = backupsOf(file()).front();
+  }
+
+  [[nodiscard]] fs::path file() const { return folder_.path() / "home.db"; }
+  [[nodiscard]] std::unique_ptr<HomeStore> open() const {
+    auto store = HomeStore::open(file(), kNoWaiting);
+    EXPECT_TRUE(store) << store.failure().message;
+    return std::move(*store);
+  }
+  [[nodiscard]] std::string homeName() const { return open()->loadHomes()->front().name.str(); }
+  [[nodiscard]] Result<HomeRestoration> restore() const {
+    return restoreHomes(folder_.path(), backup_, kNoWaiting);
+  }
+  /// Why nothing was restored.
+  [[nodiscard]] std::string refusal() const {
+    const auto done = restore();
+    return done ? "restored" : done.failure().message;
+  }
+  void change(const std::string& statements) const {
+    Database(file().string(), kNoWaiting).run(statements);
+  }
+  void makeReferencesDangle() const {
+    change("PRAGMA foreign_keys = OFF; UPDATE room SET home = 77");
+  }
+  [[nodiscard]] bool isConfigured() const {
+    const auto preferences = Preferences::open(folder_.path(), [](const Failure&) {});
+    return (*preferences)->values()[Preferences::kHomesConfigured] == JsonValue{true};
+  }
+
+  const TestFolder folder_;
+  fs::path backup_;
+};
+
+TEST_F(HomeRestorationTest, BringsBackTheHomesOfTheBackup) {
+  const auto done = restore();
+  ASSERT_TRUE(done) << done.failure().message;
+  EXPECT_FALSE(done->damaged);
+  EXPECT_EQ(done->homes.front().name, "First");
+  EXPECT_EQ(homeName(), "First");
+  EXPECT_TRUE(isConfigured());
+}
+
+TEST_F(HomeRestorationTest, KeepsWhatItReplacesAsABackup) {
+  ASSERT_TRUE(restore());
+  EXPECT_EQ(homesOfBackup(backupsOf(file()).front())->front().name, "Second");
+}
+
+TEST_F(HomeRestorationTest, OthersMayHaveASoundDatabaseOpen) {
+  const auto other = open();
+  const std::uint64_t before = *other->version();
+  ASSERT_TRUE(restore());
+  EXPECT_NE(*other->version(), before);
+  EXPECT_EQ(other->loadHomes()->front().name, "First");
+}
+
+TEST_F(HomeRestorationTest, ReplacesADamagedDatabase) {
+  const std::string damage(8192, 'x');
+  folder_.write("home.db", damage);
+  const auto done = restore();
+  ASSERT_TRUE(done) << done.failure().message;
+  ASSERT_TRUE(done->damaged);
+  EXPECT_EQ(done->damaged->filename(), "home-damaged-000001.db");
+  EXPECT_EQ(contentOfFile(*done->damaged), damage);
+  EXPECT_EQ(homeName(), "First");
+  EXPECT_TRUE(isConfigured());
+}
+
+TEST_F(HomeRestorationTest, KeepsTheLogWithTheDamagedDatabase) {
+  const std::string log = file().string() + "-wal";
+  folder_.write("home.db-wal", "the log");
+  const auto kept = replaceDamagedStore(file(), backup_, kNoWaiting);
+  ASSERT_TRUE(kept) << kept.failure().message;
+  EXPECT_EQ(contentOfFile(kept->string() + "-wal"), "the log");
+  EXPECT_FALSE(fs::exists(log));
+  EXPECT_EQ(homeName(), "First");
+}
+
+TEST_F(HomeRestorationTest, KeepsEachDamagedDatabase) {
+  for (const char* name : {"home-damaged-000001.db", "home-damaged-000002.db"}) {
+    makeReferencesDangle();
+    const auto done = restore();
+    ASSERT_TRUE(done) << done.failure().message;
+    EXPECT_EQ(done->damaged->filename(), name);
+  }
+}
+
+TEST_F(HomeRestorationTest, RefusesWhileOthersHaveADamagedOneOpen) {
+  makeReferencesDangle();
+  auto other = open();
+  ASSERT_TRUE(other->countHomes());
+  EXPECT_THAT(refusal(), HasSubstr("home.db: the database is damaged, and another process has it "
+                                   "open; end that process"));
+  EXPECT_FALSE(fs::exists(file().string() + ".restored"));
+  other.reset();
+  EXPECT_TRUE(restore());
+}
+
+TEST_F(HomeRestorationTest, LeavesANewerDatabaseAlone) {
+  change("PRAGMA user_version = 1000");
+  EXPECT_THAT(refusal(), HasSubstr("newer version"));
+}
+
+TEST_F(HomeRestorationTest, RefusesADamagedBackup) {
+  folder_.write(backup_.filename().string(), "half of it");
+  EXPECT_THAT(refusal(), HasSubstr("home-backup-000001.db: the backup is damaged; "));
+  EXPECT_EQ(homeName(), "Second");
+}
+
+TEST_F(HomeRestorationTest, MakesADatabaseThatIsGone) {
+  fs::remove(file());
+  ASSERT_TRUE(restore());
+  EXPECT_EQ(homeName(), "First");
+}
+
+TEST_F(HomeRestorationTest, DamagedPreferencesKeepAllAsItIs) {
+  folder_.write("preferences.json", "no JSON");
+  folder_.write("home.db", std::string(8192, 'x'));
+  EXPECT_THAT(refusal(), HasSubstr("preferences.json"));
+  EXPECT_EQ(contentOfFile(file()), std::string(8192, 'x'));
+}
+
+}  // namespace
+}  // namespace nidus
