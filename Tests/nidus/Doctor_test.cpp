@@ -129,7 +129,7 @@ TEST_F(DoctorTest, IsHonestAboutTheDemonstrationHome) {
                     HasSubstr("Blind Bridge: the assistant cannot address it"),
                     HasSubstr("Maple House / Downstairs: an order for this zone does not reach"),
                     HasSubstr("Garage / Garage Light: the accessory cannot be reached"),
-                    EndsWith("\n6 things need attention, with 1 note.\n")));
+                    EndsWith("\n6 things need attention, with 2 notes.\n")));
 }
 
 TEST_F(DoctorTest, AdvisesCommandsThatMend) {
