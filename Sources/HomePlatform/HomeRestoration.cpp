@@ -6,7 +6,6 @@
 #include "HomePlatform/HomePlatform.h"
 #include "HomePlatform/Store/BackupList.h"
 #include "HomePlatform/Store/DamagedStore.h"
-#include "HomePlatform/Store/StoreExamination.h"
 #include "HomePlatform/System/DataFolder.h"
 #include "HomePlatform/System/Preferences.h"
 
@@ -20,7 +19,8 @@ Result<std::shared_ptr<Preferences>> preferencesOf(const fs::path& folder) {
   return Preferences::open(folder, [](const Failure& /*said when it is opened*/) {});
 }
 
-/// Replaces the database if it is damaged, and gives where it is kept; none when it is not.
+/// Replaces the database if it is damaged, and gives where it is kept; none when it is not, or when
+/// nobody can tell: then an import says why.
 Result<std::optional<fs::path>> replaceIfDamaged(const fs::path& folder, const fs::path& backup,
                                                  std::chrono::milliseconds lockTimeout) {
   using Kept = std::optional<fs::path>;
@@ -28,15 +28,12 @@ Result<std::optional<fs::path>> replaceIfDamaged(const fs::path& folder, const f
   const Result<FolderLock> lock = FolderLock::take(folder);
   if (!lock) return lock.failure();
   if (std::error_code ignored; !fs::exists(file, ignored)) return Kept();
-  const StoreExamination found = examineStore(file, lockTimeout);
-  if (found.failures.empty()) return Kept();
-  if (!found.isDamaged) return found.failures.front();
   const auto preferences = preferencesOf(folder);
   if (!preferences) return preferences.failure();
   auto kept = replaceDamagedStore(file, backup, lockTimeout);
-  if (!kept) return kept.failure();
+  if (!kept || !*kept) return kept;
   const Status failed = (*preferences)->change({{Preferences::kHomesConfigured, JsonValue{true}}});
-  return failed ? Result<Kept>(*failed) : Result<Kept>(Kept(std::move(*kept)));
+  return failed ? Result<Kept>(*failed) : kept;
 }
 
 Status import(const fs::path& folder, const std::vector<HomeData>& homes,
@@ -54,6 +51,7 @@ Status import(const fs::path& folder, const std::vector<HomeData>& homes,
 
 Result<HomeRestoration> restoreHomes(const fs::path& folder, const fs::path& backup,
                                      std::chrono::milliseconds lockTimeout) {
+  if (Status failed = prepareDataFolder(folder)) return *failed;
   auto homes = homesOfBackup(backup);
   if (!homes) {
     return Failure{Failure::Kind::platform,

@@ -8,9 +8,9 @@
 
 #include "HomePlatform/SampleHome.h"
 #include "HomePlatform/Store/BackupList.h"
-#include "HomePlatform/Store/DamagedStore.h"
 #include "HomePlatform/Store/Database.h"
 #include "HomePlatform/System/Preferences.h"
+#include "Support/FileModes.h"
 #include "Support/TestFolder.h"
 
 namespace nidus {
@@ -54,6 +54,17 @@ class HomeRestorationTest : public testing::Test {
   }
   void makeReferencesDangle() const {
     change("PRAGMA foreign_keys = OFF; UPDATE room SET home = 77");
+  }
+  /// The bytes of the database with a page torn that its log, if there is one, has too.
+  [[nodiscard]] std::string withoutAPageOfRooms() const {
+    constexpr std::size_t kPageLength = 4096;
+    const std::int64_t page = Database(file().string(), kNoWaiting)
+                                  .number(
+                                      "SELECT rootpage FROM sqlite_schema WHERE tbl_name = 'room' "
+                                      "AND type = 'index'");
+    std::string bytes = contentOfFile(file());
+    return bytes.replace((static_cast<std::size_t>(page) - 1) * kPageLength, kPageLength,
+                         kPageLength, 'x');
   }
   [[nodiscard]] bool isConfigured() const {
     const auto preferences = Preferences::open(folder_.path(), [](const Failure&) {});
@@ -99,13 +110,48 @@ TEST_F(HomeRestorationTest, ReplacesADamagedDatabase) {
 }
 
 TEST_F(HomeRestorationTest, KeepsTheLogWithTheDamagedDatabase) {
-  const std::string log = file().string() + "-wal";
-  folder_.write("home.db-wal", "the log");
-  const auto kept = replaceDamagedStore(file(), backup_, kNoWaiting);
-  ASSERT_TRUE(kept) << kept.failure().message;
-  EXPECT_EQ(contentOfFile(kept->string() + "-wal"), "the log");
-  EXPECT_FALSE(fs::exists(log));
+  const std::vector<std::string> logs = {"-wal", "-journal", "-shm"};
+  folder_.write("home.db", std::string(8192, 'x'));
+  for (const std::string& log : logs) folder_.write("home.db" + log, "the log" + log);
+  const auto done = restore();
+  ASSERT_TRUE(done) << done.failure().message;
+  ASSERT_TRUE(done->damaged);
+  for (const std::string& log : logs) {
+    EXPECT_EQ(contentOfFile(done->damaged->string() + log), "the log" + log);
+    EXPECT_FALSE(fs::exists(file().string() + log));
+  }
   EXPECT_EQ(homeName(), "First");
+}
+
+TEST_F(HomeRestorationTest, TheLogMakesADatabaseWhole) {
+  const auto store = open();
+  ASSERT_FALSE(store->replaceHomes({sampleHome()}));
+  const TestFolder other;  // as after a power cut in the middle of a checkpoint
+  for (const char* name : {"home.db-wal", "home-backup-000001.db"}) {
+    other.write(name, contentOfFile(folder_.path() / name));
+  }
+  other.write("home.db", withoutAPageOfRooms());
+  const auto done = restoreHomes(other.path(), other.path() / "home-backup-000001.db", kNoWaiting);
+  ASSERT_TRUE(done) << done.failure().message;
+  EXPECT_FALSE(done->damaged);
+}
+
+TEST_F(HomeRestorationTest, RefusesAFolderThatOthersMayChange) {
+  fs::permissions(folder_.path(), fs::perms::group_write, fs::perm_options::add);
+  EXPECT_THAT(refusal(), HasSubstr(folder_.path().string()));
+  fs::permissions(folder_.path(), fs::perms::group_write, fs::perm_options::remove);
+  EXPECT_EQ(homeName(), "Second");
+}
+
+TEST_F(HomeRestorationTest, RefusesABackupThatOthersMayChange) {
+  fs::permissions(backup_, fs::perms::others_write, fs::perm_options::add);
+  EXPECT_THAT(refusal(), HasSubstr(backup_.string()));
+}
+
+TEST_F(HomeRestorationTest, TakesBackupsFromOthers) {
+  fs::permissions(backup_, fs::perms::others_read, fs::perm_options::add);
+  ASSERT_TRUE(restore());
+  EXPECT_EQ(permissionsOf(backup_), 0600U);
 }
 
 TEST_F(HomeRestorationTest, KeepsEachDamagedDatabase) {

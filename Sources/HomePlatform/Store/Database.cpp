@@ -67,6 +67,15 @@ void Database::useWriteAheadLog() {
   }
 }
 
+void Database::copyFrom(Database& source) {
+  constexpr const char* kMain = "main";
+  constexpr int kAllPages = -1;
+  sqlite3_backup* const copy = sqlite3_backup_init(connection_, kMain, source.connection_, kMain);
+  if (!copy) fail(sqlite3_extended_errcode(connection_));
+  sqlite3_backup_step(copy, kAllPages);
+  check(sqlite3_backup_finish(copy));  // tells of a step that failed too
+}
+
 void Database::run(const std::string& statements) {
   check(sqlite3_exec(connection_, statements.c_str(), nullptr, nullptr, nullptr));
 }

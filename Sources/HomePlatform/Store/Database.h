@@ -53,6 +53,9 @@ class Database {
 
   /// Turns the write-ahead log on; it stays on in the file.
   void useWriteAheadLog();
+  /// Puts all of `source` in place of what is here, which is to be in memory. What others write
+  /// meanwhile is in it as a whole or not at all.
+  void copyFrom(Database& source);
   /// Runs one or more statements that give no rows.
   void run(const std::string& statements);
   /// The first column of the first row of `query`, which has one.

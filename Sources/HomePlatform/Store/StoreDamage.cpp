@@ -1,6 +1,7 @@
 #include "HomePlatform/Store/StoreDamage.h"
 
 #include <algorithm>
+#include <chrono>
 #include <cstddef>
 #include <string>
 #include <string_view>
@@ -43,8 +44,12 @@ void checkReferences(Database& database, std::vector<DatabaseError>& found) {
 std::vector<DatabaseError> findDamage(Database& database) {
   std::vector<DatabaseError> found;
   try {
-    checkPages(database, found);
-    checkReferences(database, found);
+    // The engine reports a page that the disk failed to give like one that is not sound. In memory
+    // there are none of the first kind: they fail the copy.
+    Database copy(Database::kInMemory, std::chrono::milliseconds(0));
+    copy.copyFrom(database);
+    checkPages(copy, found);
+    checkReferences(copy, found);
   } catch (const DatabaseError& error) {
     // What has been found explains why no more can be looked at.
     if (found.empty()) found.push_back(error);

@@ -4,12 +4,13 @@
 #include <sys/file.h>
 #include <unistd.h>
 
-#include <array>
 #include <cerrno>
 #include <cstdlib>
 #include <string>
 #include <system_error>
+#include <vector>
 
+#include "HomePlatform/Store/BackupList.h"
 #include "HomePlatform/System/Preferences.h"
 #include "HomePlatform/System/PrivateFiles.h"
 #include "HomePlatform/System/TrustedPlace.h"
@@ -34,15 +35,21 @@ void keepFolderPrivate(const std::filesystem::path& folder) {
   if (std::filesystem::is_empty(folder, ignored)) keepPrivate(folder);
 }
 
-/// The log of the database and its index hold values of the home like the database itself.
-std::array<std::string, 5> ownFiles() {
-  const std::string database = kDatabaseFile;
-  return {database, database + "-wal", database + "-shm", Preferences::kFileName, kVocabularyFile};
+/// The log of the database, its index and the backups hold values of the home like the database
+/// itself.
+std::vector<std::filesystem::path> ownFiles(const std::filesystem::path& folder) {
+  const std::filesystem::path database = folder / kDatabaseFile;
+  std::vector<std::filesystem::path> files = backupsOf(database);
+  for (const char* suffix : {"", "-wal", "-shm", "-journal"}) {
+    files.emplace_back(database.string() + suffix);
+  }
+  files.push_back(folder / Preferences::kFileName);
+  files.push_back(folder / kVocabularyFile);
+  return files;
 }
 
 Status checkFiles(const std::filesystem::path& folder) {
-  for (const std::string& name : ownFiles()) {
-    const auto file = folder / name;
+  for (const std::filesystem::path& file : ownFiles(folder)) {
     if (Status failure = checkTrusted(file)) return failure;
     keepPrivate(file);
   }

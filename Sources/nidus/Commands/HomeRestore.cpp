@@ -83,6 +83,7 @@ Result<fs::path> choose(const fs::path& folder, const std::string& word) {
 ExitStatus restore(const RestoreOptions& options, Workspace& workspace) {
   const auto folder = dataFolderOf(workspace.settings());
   if (!folder) return report(folder.failure());
+  if (Status failed = prepareDataFolder(*folder)) return report(*failed);
   if (options.lists) return listBackups(*folder);
   const auto backup = choose(*folder, options.backup);
   if (!backup) return report(backup.failure());
