@@ -142,7 +142,7 @@ TEST_F(ShellCommandTest, CompletesAtTheTabKey) {
   terminal.write("voc\tBRIGH\t\n");
   ASSERT_TRUE(terminal.waitFor("BRIGHTNESS - an attribute"));
   terminal.write("home re\t");
-  ASSERT_TRUE(terminal.waitFor("remove  rename"));
+  ASSERT_TRUE(terminal.waitFor("remove   rename   restore"));
   terminal.write(
       "\x15"
       "exit\n");
