@@ -23,8 +23,7 @@ target_compile_options(NidusOptions INTERFACE
   -Wall -Wextra -Wpedantic -Wshadow -Wconversion
   $<$<BOOL:${NIDUS_WERROR}>:-Werror>
   $<$<CXX_COMPILER_ID:Clang>:-Wthread-safety>)
-target_link_options(NidusOptions INTERFACE -Wl,-z,relro,-z,now)
-target_link_libraries(NidusOptions INTERFACE Threads::Threads)
+target_link_libraries(NidusOptions INTERFACE NidusHardening Threads::Threads)
 if(NIDUS_SANITIZE)
   target_compile_options(NidusOptions INTERFACE
     -fsanitize=${NIDUS_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer)
