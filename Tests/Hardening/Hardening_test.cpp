@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <ostream>
 
 #include "Support/ElfFile.h"
 
@@ -24,6 +25,8 @@ struct Binary {
   const char* file;
   bool isProgram;
 };
+
+void PrintTo(const Binary& binary, std::ostream* out) { *out << binary.file; }
 
 class HardeningTest : public testing::TestWithParam<Binary> {
  protected:

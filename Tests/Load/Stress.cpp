@@ -16,6 +16,8 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
+/// The database engine puts the closing of a file off while another connection to it holds a lock.
+constexpr std::size_t kDescriptorsPutOff = 4;
 constexpr std::size_t kStepsPerChange = 64;
 constexpr std::size_t kStepsPerSync = 50;
 constexpr std::size_t kLeak = std::size_t{1} << 20;
@@ -113,7 +115,8 @@ void Stress::judgeGrowth() {
   const ProcessFigures& after = last_.figures;
   const std::string where = "from the first round to the last";
   record_.expect(after.threads <= before.threads, "there are more threads", where);
-  record_.expect(after.descriptors <= before.descriptors, "there are more descriptors", where);
+  record_.expect(after.descriptors <= before.descriptors + kDescriptorsPutOff,
+                 "there are more descriptors", where);
   if (!kIsMemoryTelling) return;
   record_.expect(after.residentKiB <= before.residentKiB + options_.growthKiB,
                  "the memory has grown", where);

@@ -54,8 +54,9 @@ class ND_EXPORT NDString {
   friend bool operator==(const NDString& a, std::string_view b) noexcept {
     return a.text_ && a.view() == b;
   }
+  /// The same; a null pointer equals null.
   friend bool operator==(const NDString& a, const char* b) noexcept {
-    return a == std::string_view(b);
+    return b ? a == std::string_view(b) : !a.text_;
   }
 
  private:

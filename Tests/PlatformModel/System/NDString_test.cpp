@@ -26,6 +26,13 @@ TEST(NDStringTest, NullPointersMakeNull) {
   EXPECT_TRUE(NDString(std::string_view()));
 }
 
+TEST(NDStringTest, NullPointersEqualNullAlone) {
+  const NDString none;
+  EXPECT_TRUE(none == nullptr);
+  EXPECT_FALSE(NDString("") == nullptr);
+  EXPECT_FALSE(none == "");
+}
+
 TEST(NDStringTest, KeepsEveryCharacter) {
   const std::string text("a\0b\xFF", 4);
   EXPECT_EQ(NDString(text).str(), text);
