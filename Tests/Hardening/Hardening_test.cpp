@@ -11,8 +11,6 @@ namespace {
 
 using testing::AllOf;
 using testing::Contains;
-using testing::Each;
-using testing::ElementsAre;
 using testing::EndsWith;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -95,10 +93,10 @@ TEST_P(HardeningTest, HasOnlyUnitsThatWereBuiltSo) {
   std::erase_if(units, [](const std::string& text) { return !text.starts_with("GNU C++"); });
   ASSERT_THAT(units, Not(IsEmpty()));
   for (const char* option : {" -fstack-protector-strong", " -fstack-clash-protection"}) {
-    EXPECT_THAT(units, Each(HasSubstr(option)));
+    EXPECT_THAT(units, testing::Each(HasSubstr(option)));
   }
 #ifdef __x86_64__
-  EXPECT_THAT(units, Each(HasSubstr(" -fcf-protection=full")));
+  EXPECT_THAT(units, testing::Each(HasSubstr(" -fcf-protection=full")));
 #endif
 }
 #endif

@@ -45,7 +45,7 @@ void copyAndCheck(const fs::path& from, const fs::path& to, std::chrono::millise
 
 /// Gives the copy the name of the next backup, once it is sound and on disk.
 fs::path makeBackup(const fs::path& file, std::chrono::milliseconds lockTimeout) {
-  const fs::path backup = nextBackupOf(file);
+  fs::path backup = nextBackupOf(file);
   const fs::path temporary = file.string() + ".backup";
   try {
     copyDatabase(file, temporary, lockTimeout);
