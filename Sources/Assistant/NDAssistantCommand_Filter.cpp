@@ -4,7 +4,7 @@
 #include <unordered_map>
 
 #include "Assistant/NDAssistantCommand.h"
-#include "Assistant/ObjectLookUp.h"
+#include "Assistant/ServiceLookUp.h"
 #include "Logging/WLOLog.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/Home/NDLookUp.h"
@@ -268,8 +268,9 @@ ObjectList NDAssistantCommand::filterObjects_byAttribute(const ObjectList& objec
 NDAssistantCommand::CharacteristicList NDAssistantCommand::filterObjects_forcharacteristicType(
     const ObjectList& objects, const NDString& type) const {
   CharacteristicList found;
+  ServiceLookUp lookUp(gather_);
   for (const HomeObjectRecord* object : objects) {
-    const auto service = serviceFromObject(*object, gather_);
+    const auto service = lookUp.service(*object);
     if (!service) {
       if (WLOShouldLogAtLevel(4)) WLOLog(4, "Filtered object %@ not a service", {*object});
       continue;

@@ -4,48 +4,64 @@
 #include <charconv>
 #include <cstdint>
 #include <optional>
+#include <stdexcept>
 #include <string_view>
-#include <vector>
 
 #include "Assistant/ObjectURL.h"
+#include "Assistant/ServiceLookUp.h"
 #include "PlatformModel/Home/NDLookUp.h"
 #include "PlatformModel/System/NDNull.h"
 
 namespace nidus {
 namespace {
 
-using Tokens = std::vector<std::string_view>;
+constexpr bool isSeparator(char c) noexcept { return c == ':' || c == '&' || c == '=' || c == '?'; }
 
-/// The four outputs of `splitIdentifier`.
-struct Identifier {
-  explicit Identifier(const NDURLRef& url) { splitIdentifier(url, kind, id, home, accessory); }
-  NDString kind;
-  NDString id;
-  NDString home;
-  NDString accessory;
-};
-
-/// Splits at every separator, so that neighbours enclose an empty token.
-Tokens tokensOf(std::string_view query) {
-  Tokens tokens;
-  for (;;) {
-    const std::size_t end = query.find_first_of(":&=?");
-    tokens.push_back(query.substr(0, end));
-    if (end == std::string_view::npos) return tokens;
-    query.remove_prefix(end + 1);
+/// Where the first token that equals `key` begins; `npos` without one. Tokens are what stands
+/// between separators, and a key has none.
+std::size_t findKey(std::string_view query, std::string_view key) noexcept {
+  for (std::size_t at = query.find(key); at != std::string_view::npos;
+       at = query.find(key, at + 1)) {
+    const std::size_t end = at + key.size();
+    const bool begins = at == 0 || isSeparator(query[at - 1]);
+    if (begins && (end == query.size() || isSeparator(query[end]))) return at;
   }
+  return std::string_view::npos;
 }
 
 /// Puts the token after the first `key` into `value`; false, and nothing done, without the key.
-bool readKey(const Tokens& tokens, std::string_view key, NDString& value) {
-  const auto found = std::find(tokens.begin(), tokens.end(), key);
-  if (found == tokens.end()) return false;
-  value = tokens.at(static_cast<std::size_t>(found - tokens.begin()) + 1);
+template <class Text>
+bool readKey(std::string_view query, std::string_view key, Text& value) {
+  const std::size_t at = findKey(query, key);
+  if (at == std::string_view::npos) return false;
+  const std::size_t end = at + key.size();
+  if (end == query.size()) throw std::out_of_range("An identifier ends with a key");
+  query.remove_prefix(end + 1);
+  const auto* const valueEnd = std::find_if(query.begin(), query.end(), isSeparator);
+  value = query.substr(0, static_cast<std::size_t>(valueEnd - query.begin()));
   return true;
 }
 
-std::optional<std::int64_t> numberFrom(const NDString& text) {
-  const std::string_view digits = text.view();
+template <class Text>
+void readParts(const NDURL& identifier, Text& kind, Text& objectID, Text& home, Text& accessory) {
+  kind = identifier.pathComponent(1);
+  const std::string_view query = identifier.queryView().value_or(std::string_view());
+  readKey(query, "id", objectID);
+  readKey(query, "home", home);
+  if (!readKey(query, "accessory", accessory)) readKey(query, "ActionSet", accessory);
+}
+
+/// The four outputs of `splitIdentifier` in the URL's own text; what is missing is empty, which
+/// names no object either.
+struct Identifier {
+  explicit Identifier(const NDURL& url) { readParts(url, kind, id, home, accessory); }
+  std::string_view kind;
+  std::string_view id;
+  std::string_view home;
+  std::string_view accessory;
+};
+
+std::optional<std::int64_t> numberFrom(std::string_view digits) {
   const char* const end = digits.data() + digits.size();
   std::int64_t number = 0;
   const auto [stop, error] = std::from_chars(digits.data(), end, number);
@@ -53,11 +69,8 @@ std::optional<std::int64_t> numberFrom(const NDString& text) {
   return number;
 }
 
-std::shared_ptr<NDHome> homeOf(const Identifier& identifier,
-                               const std::shared_ptr<NDAssistantGather>& gather) {
-  const auto manager = property(gather, &NDAssistantGather::manager);
-  return findInArrayByUUID(property(manager, &NDHomeManager::homes),
-                           NDUUID::fromText(identifier.home.view()));
+NDArray<NDHome> homesOf(const std::shared_ptr<NDAssistantGather>& gather) {
+  return property(property(gather, &NDAssistantGather::manager), &NDHomeManager::homes);
 }
 
 }  // namespace
@@ -68,32 +81,34 @@ void splitIdentifier(const NDURLRef& identifier, NDString& kind, NDString& objec
     // A foreign scheme clears the outputs and is read all the same.
     objectID = kind = home = accessory = nullptr;
   }
-  kind = identifier->pathComponents().at(1);
-  const NDString query = identifier->query();  // A URL without one has the tokens of no text.
-  const Tokens tokens = tokensOf(query.view());
-  readKey(tokens, "id", objectID);
-  readKey(tokens, "home", home);
-  if (!readKey(tokens, "accessory", accessory)) readKey(tokens, "ActionSet", accessory);
+  readParts(*identifier, kind, objectID, home, accessory);
+}
+
+ServiceLookUp::ServiceLookUp(std::shared_ptr<NDAssistantGather> gather)
+    : gather_(std::move(gather)) {}
+
+std::shared_ptr<NDService> ServiceLookUp::service(const HomeObjectRecord& record) {
+  if (!record.objectIdentifier) return nullptr;
+  const Identifier identifier(*record.objectIdentifier);
+  const auto home = homes_.find(homesOf(gather_), NDUUID::fromText(identifier.home));
+  if (!home) return nullptr;
+  const auto accessory =
+      accessories_[home.get()].find(home->accessories(), NDUUID::fromText(identifier.accessory));
+  if (!accessory) return nullptr;
+  return services_.find(accessory->services(), numberFrom(identifier.id));
 }
 
 std::shared_ptr<NDService> serviceFromObject(const HomeObjectRecord& record,
                                              const std::shared_ptr<NDAssistantGather>& gather) {
-  if (!record.objectIdentifier) return nullptr;
-  const Identifier identifier(record.objectIdentifier);
-  const auto home = homeOf(identifier, gather);
-  const auto accessory = findInArrayByUUID(property(home, &NDHome::accessories),
-                                           NDUUID::fromText(identifier.accessory.view()));
-  return findInArrayByInstanceID(property(accessory, &NDAccessory::services),
-                                 numberFrom(identifier.id));
+  return ServiceLookUp(gather).service(record);
 }
 
 std::shared_ptr<NDActionSet> actionSetFromObject(const HomeObjectRecord& record,
                                                  const std::shared_ptr<NDAssistantGather>& gather) {
   if (!record.objectIdentifier) return nullptr;
-  const Identifier identifier(record.objectIdentifier);
-  const auto home = homeOf(identifier, gather);
-  return findInArrayByUUID(property(home, &NDHome::actionSets),
-                           NDUUID::fromText(identifier.id.view()));
+  const Identifier identifier(*record.objectIdentifier);
+  const auto home = findInArrayByUUID(homesOf(gather), NDUUID::fromText(identifier.home));
+  return findInArrayByUUID(property(home, &NDHome::actionSets), NDUUID::fromText(identifier.id));
 }
 
 }  // namespace nidus

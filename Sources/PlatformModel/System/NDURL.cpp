@@ -1,6 +1,7 @@
 #include "PlatformModel/System/NDURL.h"
 
 #include <algorithm>
+#include <stdexcept>
 #include <string>
 
 namespace nidus {
@@ -10,6 +11,14 @@ namespace {
 std::size_t schemeEnd(std::string_view text) noexcept {
   const std::size_t end = text.find_first_of(":/?#");
   return end != std::string_view::npos && text[end] == ':' ? end : std::string_view::npos;
+}
+
+/// Takes the next component, which is never empty, off the front of a path; empty at the end.
+std::string_view takeComponent(std::string_view& path) noexcept {
+  path.remove_prefix(std::min(path.find_first_not_of('/'), path.size()));
+  const std::string_view component = path.substr(0, path.find('/'));
+  path.remove_prefix(component.size());
+  return component;
 }
 
 }  // namespace
@@ -42,20 +51,33 @@ std::vector<NDString> NDURL::pathComponents() const {
   std::string_view rest = path();
   std::vector<NDString> components;
   if (rest.starts_with('/')) components.emplace_back("/");
-  while (!rest.empty()) {
-    const std::string_view component = rest.substr(0, rest.find('/'));
-    if (!component.empty()) components.emplace_back(component);
-    rest.remove_prefix(std::min(component.size() + 1, rest.size()));
+  for (;;) {
+    const std::string_view component = takeComponent(rest);
+    if (component.empty()) return components;
+    components.emplace_back(component);
   }
-  return components;
+}
+
+std::string_view NDURL::pathComponent(std::size_t index) const {
+  std::string_view rest = path();
+  std::string_view component = rest.substr(0, 1);
+  if (component != "/") component = takeComponent(rest);
+  for (; index > 0 && !component.empty(); --index) component = takeComponent(rest);
+  if (component.empty()) throw std::out_of_range("A path of a URL has too few components");
+  return component;
+}
+
+std::optional<std::string_view> NDURL::queryView() const noexcept {
+  const std::string_view text = text_.view();
+  const std::size_t mark = text.find_first_of("?#");
+  if (mark == std::string_view::npos || text[mark] == '#') return std::nullopt;
+  const std::string_view query = text.substr(mark + 1);
+  return query.substr(0, query.find('#'));
 }
 
 NDString NDURL::query() const {
-  std::string_view text = text_.view();
-  text = text.substr(0, text.find('#'));
-  const std::size_t mark = text.find('?');
-  if (mark == std::string_view::npos) return {};
-  return text.substr(mark + 1);
+  const std::optional<std::string_view> query = queryView();
+  return query ? NDString(*query) : NDString();
 }
 
 }  // namespace nidus

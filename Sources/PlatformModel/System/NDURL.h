@@ -1,6 +1,8 @@
 #pragma once
 
+#include <cstddef>
 #include <memory>
+#include <optional>
 #include <string_view>
 #include <utility>
 #include <vector>
@@ -36,8 +38,13 @@ class ND_EXPORT NDURL {
   /// "/" for a path that begins with one, then the path's components without their slashes, none
   /// of them empty; empty without a path. The path ends before the first "?" or "#".
   [[nodiscard]] std::vector<NDString> pathComponents() const;
+  /// The component of that index in this URL's own text. Throws `std::out_of_range` for one that
+  /// the path has not.
+  [[nodiscard]] std::string_view pathComponent(std::size_t index) const;
   /// What follows the first "?" up to a "#"; null without a "?" before the first "#".
   [[nodiscard]] NDString query() const;
+  /// The query in this URL's own text; none where `query` gives null.
+  [[nodiscard]] std::optional<std::string_view> queryView() const noexcept;
 
   /// For the factories alone.
   explicit NDURL(NDString text) : text_(std::move(text)) {}

@@ -3,6 +3,8 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <stdexcept>
+
 namespace nidus {
 namespace {
 
@@ -65,6 +67,29 @@ TEST(NDURLTest, ReadsSchemePathAndQuery) {
     EXPECT_EQ(url->pathComponents(), expected.components);
     EXPECT_EQ(url->query(), expected.query);
   }
+}
+
+TEST(NDURLTest, ComponentsAreReadOneByOne) {
+  for (const Parts& expected : parts()) {
+    SCOPED_TRACE(expected.text);
+    const NDURLRef url = NDURL::fromText(expected.text);
+    const std::size_t count = expected.components.size();
+    for (std::size_t i = 0; i < count; ++i) {
+      EXPECT_EQ(url->pathComponent(i), expected.components[i].view());
+    }
+    EXPECT_THROW((void)url->pathComponent(count), std::out_of_range);
+    EXPECT_THROW((void)url->pathComponent(count + 1), std::out_of_range);
+  }
+}
+
+TEST(NDURLTest, ViewsLieInTheText) {
+  const NDURLRef url = NDURL::fromText("s://h/room?id=1#f");
+  const char* const text = url->text().view().data();
+  EXPECT_EQ(url->pathComponent(1).data(), text + 6);
+  ASSERT_TRUE(url->queryView());
+  EXPECT_EQ(url->queryView()->data(), text + 11);
+  EXPECT_EQ(url->queryView(), "id=1");
+  EXPECT_FALSE(NDURL::fromText("s://h#?")->queryView());
 }
 
 TEST(NDURLTest, AnyTextIsRead) {
