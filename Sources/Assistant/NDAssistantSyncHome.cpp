@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <atomic>
+#include <charconv>
 #include <chrono>
 #include <cstddef>
 #include <cstdint>
@@ -55,6 +56,23 @@ constexpr std::uint32_t kFinalAnchor = 0xCAFEBABE;
 bool isPublished(const HomeObjectRecord& record) {
   if (record.objectType == VAHAEntityTypeTRIGGERValue) return false;
   return record.objectType != VAHAEntityTypeSERVICEValue || record.objectName;
+}
+
+NDAssistantSyncHome::Entities publishedEntities(const HomeObjectRecords& records) {
+  NDAssistantSyncHome::Entities entities;
+  entities.reserve(records.size());
+  for (const HomeObjectRecord& record : records) {
+    if (isPublished(record)) entities.push_back(entityFromObject(record));
+  }
+  return entities;
+}
+
+/// The number that `anchor` begins with; 0 when there is none, or one beyond all lists.
+std::size_t numberOf(const NDString& anchor) {
+  const std::string_view text = anchor.view();
+  std::size_t number = 0;
+  std::from_chars(text.data(), text.data() + text.size(), number);
+  return number;
 }
 
 std::size_t countOf(const auto& list) { return list ? list->size() : 0; }
@@ -128,10 +146,7 @@ void NDAssistantSyncHome::gatherForSync(const std::shared_ptr<Sync>& sync,
 /// The build task. A late one still publishes and resets: the snapshot is good, only the caller
 /// could not wait for it.
 void NDAssistantSyncHome::build(Sync& sync, AFSyncBeginInfo& beginInfo) {
-  Entities entities;
-  for (const HomeObjectRecord& record : sync.gather->gatherNidusObjects()) {
-    if (isPublished(record)) entities.push_back(entityFromObject(record));
-  }
+  Entities entities = publishedEntities(sync.gather->gatherNidusObjects());
   Anchors anchors;
   anchors.reserve(entities.size());
   for (std::size_t i = 1; i < entities.size(); ++i) anchors.emplace_back(std::to_string(i));
@@ -152,6 +167,7 @@ void NDAssistantSyncHome::publish(const Sync& sync, const NDString& finalAnchor,
   if (sync_.get() != &sync) return;
   finalAnchor_ = finalAnchor;
   postAnchors_ = std::move(anchors);
+  isNumbered_ = true;
   entities_ = std::move(entities);
 }
 
@@ -172,18 +188,26 @@ void NDAssistantSyncHome::getChangeAfterAnchor_changeInfo(const NDString& anchor
       failAssertion("-[NDAssistantSyncHome getChangeAfterAnchor:changeInfo:]", 173,
                     "_postAnchors.count == _entities.count");
     }
-    std::size_t index = 0;
-    if (anchor && postAnchors_) {
-      const auto found = std::find(postAnchors_->begin(), postAnchors_->end(), anchor);
-      index = static_cast<std::size_t>(found - postAnchors_->begin()) + 1;
-    }
-    if (index < count && !(anchor && anchor == finalAnchor_)) {
+    const std::size_t index = anchor && anchor == finalAnchor_ ? count : indexAfter(anchor);
+    if (index < count) {
       entity = (*entities_)[index];
       postAnchor = (*postAnchors_)[index];
     }
   }
   changeInfo.setObject(std::move(entity));
   changeInfo.setPostAnchor(postAnchor);
+}
+
+/// The place after the first anchor that equals `anchor`: the first place for null, one beyond the
+/// last when no anchor does.
+std::size_t NDAssistantSyncHome::indexAfter(const NDString& anchor) const {
+  if (!anchor || !postAnchors_) return 0;
+  const Anchors& anchors = *postAnchors_;
+  // What a sync published says its place itself. A list that was set from outside may say any.
+  const std::size_t number = isNumbered_ ? numberOf(anchor) : 0;
+  if (number > 0 && number <= anchors.size() && anchors[number - 1] == anchor) return number;
+  const auto found = std::find(anchors.begin(), anchors.end(), anchor);
+  return static_cast<std::size_t>(found - anchors.begin()) + 1;
 }
 
 void NDAssistantSyncHome::syncDidEnd() {
@@ -227,6 +251,7 @@ std::optional<NDAssistantSyncHome::Anchors> NDAssistantSyncHome::postAnchors() c
 void NDAssistantSyncHome::setPostAnchors(std::optional<Anchors> anchors) {
   const NDLock lock(mutex_);
   postAnchors_.swap(anchors);
+  isNumbered_ = false;
 }
 
 std::optional<NDAssistantSyncHome::Entities> NDAssistantSyncHome::entities() const {

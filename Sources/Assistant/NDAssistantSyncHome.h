@@ -91,12 +91,15 @@ class NDAssistantSyncHome final : public AFSyncHandler,
   void build(Sync& sync, AFSyncBeginInfo& beginInfo);
   void publish(const Sync& sync, const NDString& finalAnchor, Anchors anchors, Entities entities);
   void watch(Sync& sync);
+  [[nodiscard]] std::size_t indexAfter(const NDString& anchor) const ND_REQUIRES(mutex_);
 
   const std::shared_ptr<NDClock> clock_;
   mutable NDMutex mutex_;
   std::shared_ptr<Sync> sync_ ND_GUARDED_BY(mutex_);
   NDString finalAnchor_ ND_GUARDED_BY(mutex_);
   std::optional<Anchors> postAnchors_ ND_GUARDED_BY(mutex_);
+  /// Whether the anchors are those of a sync, each of which but the last is its own place.
+  bool isNumbered_ ND_GUARDED_BY(mutex_) = false;
   std::optional<Entities> entities_ ND_GUARDED_BY(mutex_);
   std::shared_ptr<NDQueue> queue_ ND_GUARDED_BY(mutex_);
   std::shared_ptr<NDHomeManager> manager_ ND_GUARDED_BY(mutex_);

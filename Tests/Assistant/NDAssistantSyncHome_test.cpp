@@ -169,6 +169,30 @@ TEST_F(NDAssistantSyncHomeTest, FinalAnchorEndsTheDataWherever) {
   EXPECT_EQ(change(nullptr), "E0 1");
 }
 
+TEST_F(NDAssistantSyncHomeTest, OtherSpellingsOfAnAnchorAreUnknown) {
+  useHome(fourObjects());
+  begin();
+  for (const std::string anchor : {"02", "+2", "2 ", " 2", "2x", "-2", "18446744073709551618"}) {
+    EXPECT_EQ(change(anchor), "end " + anchor);
+  }
+}
+
+TEST_F(NDAssistantSyncHomeTest, FirstOfEqualAnchorsThatAreSetCounts) {
+  useHome(fourObjects());
+  begin();
+  sync_->setPostAnchors(NDAssistantSyncHome::Anchors{"2", "2", "2", "1"});
+  EXPECT_EQ(change("2"), "E1 2");
+  EXPECT_EQ(change("1"), "end 1");
+  EXPECT_EQ(change("3"), "end 3");
+}
+
+TEST_F(NDAssistantSyncHomeTest, SyncCountsAgainAfterAListThatWasSet) {
+  useHome(fourObjects());
+  sync_->setPostAnchors(NDAssistantSyncHome::Anchors{"3"});
+  begin();
+  EXPECT_EQ(change("3"), "E3 3405691582");
+}
+
 TEST_F(NDAssistantSyncHomeTest, OneEntityHasTheFinalAnchor) {
   useHome(HomeBuilder("Cabin"));
   EXPECT_THAT(begin()->resets, ElementsAre("3405691582"));
