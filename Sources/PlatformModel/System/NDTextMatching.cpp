@@ -1,7 +1,10 @@
 #include "PlatformModel/System/NDTextMatching.h"
 
 #include <algorithm>
+#include <array>
+#include <cstddef>
 #include <cstdint>
+#include <span>
 
 #include "PlatformModel/System/UnicodeTables.h"
 
@@ -50,8 +53,9 @@ char32_t takeCodePoint(std::string_view& text) noexcept {
   return codePoint;
 }
 
-/// Hangul syllables are built from their parts by a rule, which is part of the Unicode standard.
-bool appendHangul(std::u32string& out, char32_t codePoint) {
+/// The parts of a Hangul syllable, which follow from a rule that is part of the Unicode standard;
+/// none for other code points.
+std::span<const char32_t> hangulParts(char32_t codePoint, std::array<char32_t, 3>& parts) {
   constexpr char32_t kFirstSyllable = 0xAC00;
   constexpr char32_t kLeadBase = 0x1100;
   constexpr char32_t kVowelBase = 0x1161;
@@ -59,25 +63,20 @@ bool appendHangul(std::u32string& out, char32_t codePoint) {
   constexpr char32_t kVowels = 21;
   constexpr char32_t kTrails = 28;
   constexpr char32_t kSyllables = 19 * kVowels * kTrails;
-  if (codePoint < kFirstSyllable || codePoint >= kFirstSyllable + kSyllables) return false;
+  if (codePoint < kFirstSyllable || codePoint >= kFirstSyllable + kSyllables) return {};
   const char32_t index = codePoint - kFirstSyllable;
-  out.push_back(kLeadBase + index / (kVowels * kTrails));
-  out.push_back(kVowelBase + index / kTrails % kVowels);
-  if (index % kTrails != 0) out.push_back(kTrailBase + index % kTrails);
-  return true;
+  parts = {kLeadBase + index / (kVowels * kTrails), kVowelBase + index / kTrails % kVowels,
+           kTrailBase + index % kTrails};
+  return {parts.data(), index % kTrails == 0 ? 2U : 3U};
 }
 
-void appendDecomposition(std::u32string& out, char32_t codePoint) {
-  if (appendHangul(out, codePoint)) return;
+/// The canonical decomposition of a code point; none for one that stays what it is.
+std::span<const char32_t> decomposition(char32_t codePoint) noexcept {
   const auto entry = std::lower_bound(
       kDecompositions.begin(), kDecompositions.end(), codePoint,
       [](const Decomposition& candidate, char32_t wanted) { return candidate.codePoint < wanted; });
-  if (entry == kDecompositions.end() || entry->codePoint != codePoint) {
-    out += codePoint;
-    return;
-  }
-  const auto parts = kDecompositionPool.subspan(entry->offset, entry->length);
-  out.append(parts.begin(), parts.end());
+  if (entry == kDecompositions.end() || entry->codePoint != codePoint) return {};
+  return kDecompositionPool.subspan(entry->offset, entry->length);
 }
 
 /// The range that holds `codePoint`; null for what has no combining class and is no mark.
@@ -93,23 +92,92 @@ std::uint8_t combiningClass(char32_t codePoint) noexcept {
   return range ? range->combiningClass : 0;
 }
 
-bool isNonspacingMark(char32_t codePoint) noexcept {
-  const CombiningRange* range = combiningRange(codePoint);
-  return range && range->isNonspacingMark;
+/// Gives the code points of a text without its diacritics, one after the other. Few of them are
+/// held at a time, so names are read without memory of their own.
+class FoldedText {
+ public:
+  explicit FoldedText(std::string_view text) noexcept : rest_(text) {}
+
+  /// The next code point; `kEnd` after the last one.
+  char32_t next() {
+    if (given_ == settled_) settleMore();
+    return given_ < settled_ ? held_[given_++] : kEnd;
+  }
+
+  static constexpr char32_t kEnd = 0xFFFFFFFF;
+
+ private:
+  void settleMore() {
+    held_.erase(0, given_);
+    given_ = settled_ = 0;
+    while (settled_ == 0 && !rest_.empty()) takeDecomposed(takeCodePoint(rest_));
+    if (settled_ == 0) settleRun();
+  }
+
+  void takeDecomposed(char32_t codePoint) {
+    if (codePoint < 0x80) return takeStarter(codePoint);
+    std::array<char32_t, 3> syllable{};
+    auto parts = hangulParts(codePoint, syllable);
+    if (parts.empty()) parts = decomposition(codePoint);
+    if (parts.empty()) parts = {&codePoint, 1};
+    for (const char32_t part : parts) take(part);
+  }
+
+  void take(char32_t codePoint) {
+    const CombiningRange* range = combiningRange(codePoint);
+    if (!range) return takeStarter(codePoint);
+    // A mark without a class goes too, but keeps what is before it from moving past it.
+    if (range->combiningClass == 0) settleRun();
+    if (!range->isNonspacingMark) held_.push_back(codePoint);
+  }
+
+  void takeStarter(char32_t codePoint) {
+    settleRun();
+    held_.push_back(codePoint);
+    settled_ = held_.size();
+  }
+
+  /// Puts the combining characters that have come since the last starter into the order of their
+  /// classes. They move no more.
+  void settleRun() {
+    if (held_.size() - settled_ > 1) {
+      std::stable_sort(
+          held_.begin() + static_cast<std::ptrdiff_t>(settled_), held_.end(),
+          [](char32_t a, char32_t b) { return combiningClass(a) < combiningClass(b); });
+    }
+    settled_ = held_.size();
+  }
+
+  std::string_view rest_;
+  std::u32string held_;  // what is settled, then what may still move
+  std::size_t given_ = 0;
+  std::size_t settled_ = 0;
+};
+
+bool isFoldedAlike(std::string_view a, std::string_view b) {
+  FoldedText foldedA(a);
+  FoldedText foldedB(b);
+  for (;;) {
+    const char32_t next = foldedA.next();
+    if (next != foldedB.next()) return false;
+    if (next == FoldedText::kEnd) return true;
+  }
 }
 
-/// Puts each run of combining characters into the order of their classes.
-void reorder(std::u32string& text) {
-  const auto isStarter = [](char32_t codePoint) { return combiningClass(codePoint) == 0; };
-  const auto isBefore = [](char32_t a, char32_t b) {
-    return combiningClass(a) < combiningClass(b);
-  };
-  auto begin = text.begin();
-  while (begin != text.end()) {
-    begin = std::find_if_not(begin, text.end(), isStarter);
-    const auto end = std::find_if(begin, text.end(), isStarter);
-    std::stable_sort(begin, end, isBefore);
-    begin = end;
+/// Cuts the ASCII characters that both texts begin with.
+void cutCommonStart(std::string_view& a, std::string_view& b) noexcept {
+  std::size_t same = 0;
+  const std::size_t shorter = std::min(a.size(), b.size());
+  while (same < shorter && a[same] == b[same] && isASCII(a[same])) ++same;
+  a.remove_prefix(same);
+  b.remove_prefix(same);
+}
+
+/// Cuts the ASCII characters that both texts end with.
+void cutCommonEnd(std::string_view& a, std::string_view& b) noexcept {
+  while (!a.empty() && !b.empty() && a.back() == b.back() && isASCII(a.back())) {
+    a.remove_suffix(1);
+    b.remove_suffix(1);
   }
 }
 
@@ -118,24 +186,24 @@ void reorder(std::u32string& text) {
 std::u32string withoutDiacritics(std::string_view text) {
   std::u32string out;
   out.reserve(text.size());
-  while (!text.empty()) appendDecomposition(out, takeCodePoint(text));
-  // Before the marks go: a mark without a class keeps others from moving past it.
-  reorder(out);
-  std::erase_if(out, isNonspacingMark);
+  FoldedText folded(text);
+  for (char32_t next = folded.next(); next != FoldedText::kEnd; next = folded.next()) out += next;
   return out;
 }
 
 bool isEqualIgnoringDiacritics(std::string_view a, std::string_view b) {
-  // No ASCII character changes or moves, so the texts may be cut after any of them.
-  std::size_t same = 0;
-  const std::size_t shorter = std::min(a.size(), b.size());
-  while (same < shorter && a[same] == b[same] && isASCII(a[same])) ++same;
-  a.remove_prefix(same);
-  b.remove_prefix(same);
+  // No ASCII character changes or moves, so the texts may be cut beside any of them, and where both
+  // have one, or one has it and the other ends, it decides. The ends come first: names that differ
+  // in a number do so there.
+  cutCommonEnd(a, b);
+  const bool isASCIILastInA = a.empty() || isASCII(a.back());
+  const bool isASCIILastInB = b.empty() || isASCII(b.back());
+  if (isASCIILastInA && isASCIILastInB) return a.empty() && b.empty();
+  cutCommonStart(a, b);
   const bool isASCIINextInA = a.empty() || isASCII(a.front());
   const bool isASCIINextInB = b.empty() || isASCII(b.front());
   if (isASCIINextInA && isASCIINextInB) return a.empty() && b.empty();
-  return a == b || withoutDiacritics(a) == withoutDiacritics(b);
+  return a == b || isFoldedAlike(a, b);
 }
 
 bool containsIgnoringCase(std::string_view text, std::string_view part) {
