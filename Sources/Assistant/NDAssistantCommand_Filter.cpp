@@ -52,25 +52,36 @@ bool isRoom(const HomeObjectRecord& object, const NDString& roomName, const NDSt
          (!roomName || isEqualButDiacritics(object.objectName, roomName));
 }
 
-/// The records of a list by the room that they are in, so that each room finds its own at once.
+/// The records of a list that are in certain rooms, by the names of these, diacritics ignored.
 class ObjectsByRoom {
  public:
-  explicit ObjectsByRoom(const ObjectList& objects) {
+  /// Gives the place of the records in rooms of that name, which are kept from now on. It stays
+  /// where it is.
+  [[nodiscard]] const ObjectList& inRoom(const NDString& roomName) {
+    return byName_[withoutDiacritics(roomName.view())];
+  }
+
+  /// Puts each record of `objects` into its place, if it has one.
+  void add(const ObjectList& objects) {
+    // The objects of a room share the text of its name, and mostly follow each other.
+    const char* name = nullptr;
+    ObjectList* place = nullptr;
     for (const HomeObjectRecord* object : objects) {
-      if (object->objectRoom) inRoom(object->objectRoom).push_back(object);
+      if (!object->objectRoom) continue;
+      const std::string_view roomName = object->objectRoom.view();
+      if (roomName.data() != name) place = placeOf(roomName);
+      name = roomName.data();
+      if (place) place->push_back(object);
     }
   }
 
-  /// The records in rooms of that name, diacritics ignored.
-  [[nodiscard]] ObjectList& inRoom(const NDString& roomName) {
-    ObjectList*& objects = bySpelling_[roomName];
-    if (!objects) objects = &byName_[withoutDiacritics(roomName.view())];
-    return *objects;
+ private:
+  ObjectList* placeOf(std::string_view roomName) {
+    const auto found = byName_.find(withoutDiacritics(roomName));
+    return found == byName_.end() ? nullptr : &found->second;
   }
 
- private:
   std::unordered_map<std::u32string, ObjectList> byName_;
-  std::unordered_map<NDString, ObjectList*> bySpelling_;
 };
 
 /// One search: narrows the snapshot field by field of the filter. A step runs only while there is
@@ -240,11 +251,15 @@ std::optional<ObjectList> NDAssistantCommand::objectsWithSearchFilter_inHome(
 ObjectList NDAssistantCommand::filterObjects_forRoom_andZone(const ObjectList& objects,
                                                              const NDString& roomName,
                                                              const NDString& zoneName) const {
-  ObjectsByRoom objectsByRoom(objects);
-  ObjectList kept;
+  ObjectsByRoom objectsByRoom;
+  std::vector<const ObjectList*> rooms;
   for (const HomeObjectRecord& object : nidusObjects_) {
-    if (isRoom(object, roomName, zoneName)) append(kept, objectsByRoom.inRoom(object.objectName));
+    if (!isRoom(object, roomName, zoneName)) continue;
+    rooms.push_back(&objectsByRoom.inRoom(object.objectName));
   }
+  objectsByRoom.add(objects);
+  ObjectList kept;
+  for (const ObjectList* room : rooms) append(kept, *room);
   return kept;
 }
 

@@ -6,6 +6,7 @@
 #include <optional>
 #include <stdexcept>
 #include <string_view>
+#include <utility>
 
 #include "Assistant/ObjectURL.h"
 #include "Assistant/ServiceLookUp.h"

@@ -264,6 +264,28 @@ TEST_F(FilterTest, GoesRoomByRoom) {
   EXPECT_THAT(names(found), ElementsAre("Fan", "Lamp", "Heater"));
 }
 
+TEST_F(FilterTest, TellsMixedRoomsApart) {
+  snapshot({roomRecord("Hall", "Ground"), roomRecord("Attic", "Top"), roomRecord("Den", "Ground"),
+            serviceInRoom("Lamp", "Hall"), serviceInRoom("Fan", "Attic"),
+            serviceInRoom("Radio", nullptr), serviceInRoom("Heater", "H\u00e0ll"),
+            serviceInRoom("Blind", "Den"), serviceInRoom("Vent", "hall"),
+            serviceInRoom("Lock", "Hall")});
+  const auto kept =
+      command_->filterObjects_forRoom_andZone(command_->allObjects(), nullptr, "Ground");
+  EXPECT_THAT(names(kept), ElementsAre("Lamp", "Heater", "Lock", "Blind"));
+}
+
+TEST_F(FilterTest, FindsObjectsOfOneRoomThatShareItsName) {
+  const NDString hall = "Hall";
+  const NDString attic = "Attic";
+  snapshot({roomRecord(hall), roomRecord(attic), serviceInRoom("Lamp", attic),
+            serviceInRoom("Fan", attic), serviceInRoom("Heater", hall),
+            serviceInRoom("Radio", nullptr), serviceInRoom("Blind", hall)});
+  const auto kept =
+      command_->filterObjects_forRoom_andZone(command_->allObjects(), "Hall", nullptr);
+  EXPECT_THAT(names(kept), ElementsAre("Heater", "Blind"));
+}
+
 TEST_F(FilterTest, FindsObjectsOfEveryRoomWithoutNames) {
   snapshot({roomRecord("Hall"), serviceInRoom("Lamp", "Hall"), serviceRecord("Fan")});
   const auto found =

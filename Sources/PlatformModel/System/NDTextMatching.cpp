@@ -184,6 +184,7 @@ void cutCommonEnd(std::string_view& a, std::string_view& b) noexcept {
 }  // namespace
 
 std::u32string withoutDiacritics(std::string_view text) {
+  if (std::all_of(text.begin(), text.end(), isASCII)) return {text.begin(), text.end()};
   std::u32string out;
   out.reserve(text.size());
   FoldedText folded(text);
