@@ -20,16 +20,17 @@ std::string programFolders() {
   std::istringstream parts(path ? path : kUsualFolders);
   std::string folders;
   for (std::string part; std::getline(parts, part, ':');) {
-    if (part.starts_with('/')) folders += (folders.empty() ? "" : ":") + part;
+    if (part.starts_with('/')) folders.append(":").append(part);
   }
-  return folders.empty() ? kUsualFolders : folders;
+  return folders.empty() ? kUsualFolders : folders.substr(1);
 }
 
 std::string findProgram(const std::string& name, const std::string& folders) {
   if (name.find('/') != std::string::npos) return name;
   std::istringstream parts(folders);
   for (std::string folder; std::getline(parts, folder, ':');) {
-    std::string program = folder + '/' + name;
+    std::string program = folder;
+    program.append("/").append(name);
     if (::access(program.c_str(), X_OK) == 0) return program;
   }
   return {};
