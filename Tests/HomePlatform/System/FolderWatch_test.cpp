@@ -93,8 +93,10 @@ TEST(FolderWatchFailureTest, NeedsFilesToBeLeft) {
   const TestFolder folder;
   for (const std::size_t spare : {0U, 1U}) {
     SCOPED_TRACE(spare);
-    const FileShortage shortage(spare);
-    const auto started = FolderWatch::start(folder.path(), {{"watched"}}, [] {});
+    const auto started = [&] {
+      const FileShortage shortage(spare);
+      return FolderWatch::start(folder.path(), {{"watched"}}, [] {});
+    }();
     ASSERT_FALSE(started);
     EXPECT_THAT(started.failure().message,
                 HasSubstr(": changes cannot be watched: Too many open files; end other programs"));

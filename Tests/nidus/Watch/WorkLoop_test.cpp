@@ -37,8 +37,10 @@ TEST(RunUntilInterruptedTest, SignalEndsItAndIsTakenBack) {
 
 TEST(RunUntilInterruptedTest, NeedsAFileToBeLeft) {
   NDMainQueue queue;
-  const FileShortage shortage;
-  const Status failure = runUntilInterrupted(queue, [] { return true; });
+  const Status failure = [&] {
+    const FileShortage shortage;
+    return runUntilInterrupted(queue, [] { return true; });
+  }();
   ASSERT_TRUE(failure);
   EXPECT_EQ(failure->kind, Failure::Kind::platform);
   EXPECT_THAT(failure->message,
