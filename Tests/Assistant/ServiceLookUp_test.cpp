@@ -124,7 +124,7 @@ TEST_F(ServiceLookUpTest, FirstOfTwoHomesIsFound) {
   for (int i = 0; i < 20; ++i) {
     const auto record =
         recordOf(*homes[static_cast<std::size_t>(i)]->accessories()[3]->services()[0]);
-    const auto& first = homes[static_cast<std::size_t>(i / 2 * 2)];
+    const auto& first = homes[static_cast<std::size_t>(i) / 2 * 2];
     EXPECT_EQ(lookUp_.service(record), first->accessories()[3]->services()[0]);
   }
 }
