@@ -80,8 +80,9 @@ TEST_P(HardeningTest, CallsCheckedFunctions) {
     return !name.starts_with("__") || !name.ends_with("_chk");
   });
   EXPECT_EQ(checked.empty(), std::string_view(GetParam().label) == "library");
+  // Not vsnprintf: the standard library hands its address on where it writes a floating number.
   for (const char* unchecked : {"printf", "fprintf", "vfprintf", "sprintf", "vsprintf", "snprintf",
-                                "vsnprintf", "strcpy", "strcat", "gets"}) {
+                                "strcpy", "strcat", "gets"}) {
     EXPECT_THAT(elf_.importedSymbols(), Not(Contains(unchecked)));
   }
 }
