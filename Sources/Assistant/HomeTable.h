@@ -27,8 +27,8 @@ class HomeTable {
     if (home) itemsOf(home).push_back(std::move(item));
   }
 
-  /// Hands each home that is still there, never null, with its items, never empty, to `visit`. Called
-  /// once.
+  /// Hands each home that is still there, never null, with its items, never empty, to `visit`.
+  /// Called once.
   template <class Visit>
   void forEachHome(const Visit& visit) {
     for (Entry& entry : entries_) {
