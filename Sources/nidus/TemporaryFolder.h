@@ -11,7 +11,8 @@ namespace nidus {
 /// unless it is kept.
 class TemporaryFolder {
  public:
-  /// Makes one in the folder for temporary files (TMPDIR, else /tmp), unless others could exchange it.
+  /// Makes one in the folder for temporary files (TMPDIR, else /tmp), unless others could exchange
+  /// it.
   [[nodiscard]] static Result<TemporaryFolder> make();
   TemporaryFolder(TemporaryFolder&& other) noexcept
       : path_(std::exchange(other.path_, {})), isKept_(other.isKept_) {}
