@@ -8,7 +8,6 @@ namespace nidus {
 namespace {
 
 using ::testing::EndsWith;
-using ::testing::HasSubstr;
 using ::testing::IsEmpty;
 using ::testing::IsSupersetOf;
 
