@@ -89,6 +89,30 @@ TEST_F(InstalledModuleTest, IsNotLookedForInTheWorkingFolder) {
   std::filesystem::current_path(old);
 }
 
+TEST_F(InstalledModuleTest, IsNotLookedForWhereTheEnvironmentPoints) {
+  const std::string other = folder_.file("other");
+  std::filesystem::create_directories(other + "/lib/nidus");
+  for (const std::string below : {"/", "/lib/nidus/"}) {
+    std::filesystem::copy_file(NIDUS_SILENT_MODULE, other + below + "NidusAssistant.so");
+  }
+  ProgramStart installed = start({"records"});
+  installed.program = program();
+  installed.environment = {{"LD_LIBRARY_PATH", NIDUS_LIBRARIES ":" + other}};
+  for (const char* variable : {"HOME", "NIDUS_DATA", "NIDUS_HOME", "NIDUS_MODULE", "PATH", "PWD",
+                               "XDG_DATA_HOME", "XDG_CONFIG_HOME"}) {
+    installed.environment[variable] = other;
+  }
+  EXPECT_THAT(runProgram(installed).errors,
+              IsOneFailure(module() + ": the plug-in module is not there"));
+}
+
+TEST_F(InstalledModuleTest, IsLoadedWithTheLibrariesOfTheInstallation) {
+  folder_.write("libPlatformModel.so", "no library");
+  ProgramStart built = start({"records"});
+  built.environment = {{"LD_LIBRARY_PATH", folder_.path().string()}};
+  EXPECT_EQ(runProgram(built).errors, "");
+}
+
 TEST_F(InstalledModuleTest, MayGiveNoReply) {
   install(NIDUS_SILENT_MODULE);
   const ProgramEnd end = runInstalled({"perform"}, "{}\n");
