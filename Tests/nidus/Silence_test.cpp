@@ -74,5 +74,15 @@ TEST_F(SilenceTest, KeepsValuesThatAreShown) {
   expectSilence({"shell"}, "get brightness\nget hue\nexplain get hue\n");
 }
 
+TEST_F(SilenceTest, KeepsValuesThatAreRefused) {
+  std::string document = documentOf({markedHome()});
+  const std::string sound = std::string(R"("value": )") + kValue;
+  document.replace(document.find(sound), sound.size(), std::string(R"("value": ")") + kValue + '"');
+  const std::string file = folder_.write("refused.json", document);
+  EXPECT_THAT(run({"home", "import", file}).errors,
+              HasSubstr("/characteristics/0/value: expected"));
+  expectSilence({"home", "import", file});
+}
+
 }  // namespace
 }  // namespace nidus
