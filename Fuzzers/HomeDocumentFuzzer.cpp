@@ -1,7 +1,7 @@
 #include <optional>
 #include <sstream>
 
-#include "HomePlatform/Json/JsonObject.h"
+#include "HomePlatform/Json/JsonReader.h"
 #include "HomePlatform/Store/HomeDocument.h"
 #include "Support/DataText.h"
 #include "Support/Finding.h"
@@ -16,8 +16,9 @@ namespace {
 
 std::optional<std::vector<HomeData>> readAsPart(std::string_view text) {
   try {
-    const JsonValue document = parseJson(text);
-    return homesFromJson(JsonPlaced(document, "/home"));
+    std::vector<HomeData> homes;
+    readJson(text, *makeHomeDocumentEvents(homes), kHomeDocumentLimits);
+    return homes;
   } catch (const JsonError&) {
     return std::nullopt;
   }

@@ -132,7 +132,7 @@ CommandRef commandFromJson(const JsonPlaced& command) {
 
 Result<CommandRef> readCommand(std::string_view text, const std::string& name) {
   try {
-    const JsonValue document = parseJson(text);
+    const JsonValue document = parseJson(text, kCommandLimits);
     return commandFromJson(JsonPlaced(document, ""));
   } catch (const JsonError& error) {
     return failureOf(error, name);

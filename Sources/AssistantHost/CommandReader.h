@@ -21,4 +21,7 @@ using CommandRef = std::shared_ptr<const VAHACommand>;
 /// Reads a text that is one command; `name` stands for the text in the failure, which is bad input.
 [[nodiscard]] Result<CommandRef> readCommand(std::string_view text, const std::string& name);
 
+/// How much of a text has to be read to see whether it is one command or too long to be one.
+inline constexpr std::size_t kBytesToJudge = kCommandLimits.documentBytes + 1;
+
 }  // namespace nidus

@@ -1,5 +1,7 @@
 #include "AssistantHost/InputFile.h"
 
+#include <algorithm>
+#include <array>
 #include <cerrno>
 #include <system_error>
 
@@ -21,11 +23,14 @@ Result<std::ifstream> openInput(const std::filesystem::path& file) {
   return in;
 }
 
-Result<std::string> readAll(std::istream& in, const std::string& name) {
+Result<std::string> readUpTo(std::size_t mostBytes, std::istream& in, const std::string& name) {
   std::string text;
-  char block[65536];
-  while (in.read(block, sizeof block) || in.gcount() > 0) {
-    text.append(block, static_cast<std::size_t>(in.gcount()));
+  std::array<char, 65536> block;
+  while (text.size() < mostBytes) {
+    const std::size_t size = std::min(block.size(), mostBytes - text.size());
+    in.read(block.data(), static_cast<std::streamsize>(size));
+    if (in.gcount() == 0) break;
+    text.append(block.data(), static_cast<std::size_t>(in.gcount()));
   }
   if (in.bad()) return inputFailure(name, "an error of the disk or the connection");
   return text;

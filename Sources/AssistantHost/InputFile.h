@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <filesystem>
 #include <fstream>
 #include <istream>
@@ -12,7 +13,8 @@ namespace nidus {
 /// Opens a file for reading. A file that is missing, unreadable or a folder is bad input.
 [[nodiscard]] Result<std::ifstream> openInput(const std::filesystem::path& file);
 
-/// Reads all that is left of `in`, which `name` stands for in the failure.
-[[nodiscard]] Result<std::string> readAll(std::istream& in, const std::string& name);
+/// Reads what is left of `in`, but no more than `mostBytes`. `name` stands for it in the failure.
+[[nodiscard]] Result<std::string> readUpTo(std::size_t mostBytes, std::istream& in,
+                                           const std::string& name);
 
 }  // namespace nidus

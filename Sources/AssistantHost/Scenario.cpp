@@ -3,8 +3,9 @@
 #include <utility>
 
 #include "AssistantHost/InputFile.h"
-#include "AssistantHost/JsonChoice.h"
-#include "HomePlatform/Json/JsonObject.h"
+#include "AssistantHost/ScenarioSteps.h"
+#include "HomePlatform/Json/JsonBuilder.h"
+#include "HomePlatform/Json/JsonReader.h"
 #include "HomePlatform/Store/HomeDocument.h"
 
 namespace nidus {
@@ -12,86 +13,8 @@ namespace {
 
 constexpr std::string_view kFormat = "nidus-scenario/1";
 
-NDString optionalText(JsonObject& object, std::string_view key) {
-  const auto text = object.optional(key);
-  return text ? NDString(text->text()) : NDString();
-}
-
-std::optional<bool> optionalBoolean(JsonObject& object, std::string_view key) {
-  const auto boolean = object.optional(key);
-  return boolean ? std::optional(boolean->boolean()) : std::nullopt;
-}
-
-std::optional<PreferenceChanges> optionalPreferences(JsonObject& object) {
-  const auto placed = object.optional("preferences");
-  if (!placed) return std::nullopt;
-  const auto* members = std::get_if<JsonValue::Object>(&placed->value().content);
-  if (!members) placed->fail("expected an object");
-  return PreferenceChanges(members->begin(), members->end());
-}
-
-ScenarioStep recordsStep(const JsonPlaced& placed) {
-  JsonObject(placed).refuseUnknownKeys();
-  return RecordsStep();
-}
-
-ScenarioStep performStep(const JsonPlaced& placed) { return PerformStep{commandFromJson(placed)}; }
-
-std::vector<NDString> anchorsFromJson(const JsonPlaced& placed) {
-  std::vector<NDString> anchors;
-  for (const JsonPlaced& anchor : placed.array()) {
-    anchors.push_back(anchor.isNull() ? NDString() : NDString(anchor.text()));
-  }
-  return anchors;
-}
-
-ScenarioStep syncStep(const JsonPlaced& placed) {
-  SyncStep step;
-  JsonObject object(placed);
-  step.key = object.required("key").text();
-  step.anchor = optionalText(object, "anchor");
-  step.validity = optionalText(object, "validity");
-  if (const auto after = object.optional("after")) step.after = anchorsFromJson(*after);
-  object.refuseUnknownKeys();
-  return step;
-}
-
-ScenarioStep setStep(const JsonPlaced& placed) {
-  SetStep step;
-  JsonObject object(placed);
-  step.locked = optionalBoolean(object, "locked");
-  step.silent = optionalBoolean(object, "silent");
-  step.preferences = optionalPreferences(object);
-  object.refuseUnknownKeys();
-  return step;
-}
-
-ScenarioStep exportStep(const JsonPlaced& placed) {
-  JsonObject(placed).refuseUnknownKeys();
-  return ExportStep();
-}
-
-struct StepKind {
-  std::string_view key;
-  ScenarioStep (*read)(const JsonPlaced&);
-};
-
-constexpr StepKind kStepKinds[] = {
-    {"records", recordsStep}, {"perform", performStep}, {"sync", syncStep},
-    {"set", setStep},         {"export", exportStep},
-};
-
-ScenarioStep stepFromJson(const JsonPlaced& placed) {
-  std::vector<std::string_view> keys;
-  for (const StepKind& kind : kStepKinds) keys.push_back(kind.key);
-  const std::string_view chosen = chosenKey(placed, keys);
-  JsonObject object(placed);
-  const JsonPlaced content = object.required(chosen);
-  object.refuseUnknownKeys();
-  for (const StepKind& kind : kStepKinds) {
-    if (kind.key == chosen) return kind.read(content);
-  }
-  placed.fail("no such step");
+void checkFormat(const JsonPlaced& format) {
+  if (format.text() != kFormat) format.fail("expected \"" + std::string(kFormat) + '"');
 }
 
 /// A scenario and, when its homes stand in another file, that file's name.
@@ -100,42 +23,113 @@ struct ReadScenario {
   std::optional<std::string> homeFile;
 };
 
-void readHomes(JsonObject& object, ReadScenario& read) {
-  const auto home = object.optional("home");
-  const auto homeFile = object.optional("homeFile");
-  if (home.has_value() == homeFile.has_value()) {
-    object.placed().fail("expected exactly one of the keys \"home\", \"homeFile\"");
+/// Takes a scenario apart while it is read, so that it never stands in memory as a tree: its homes
+/// go to a reader of their own, its steps are read one by one.
+class ScenarioEvents final : public JsonEvents {
+ public:
+  void scalar(JsonValue value, const JsonPath& path) override {
+    const bool isNull = std::holds_alternative<std::nullptr_t>(value.content);
+    if (isHome(path) && !isNull) failHome(path);
+    if (isMember(path) && key_ == "format") checkFormat(JsonPlaced(value, path.place()));
+    receiver(path).scalar(std::move(value), path);
+    endValue(path);
   }
-  if (home) read.scenario.homes = homesFromJson(*home);
-  if (homeFile) read.homeFile = homeFile->text();
-}
 
-ReadScenario scenarioFromJson(const JsonPlaced& document) {
-  ReadScenario read;
-  Scenario& scenario = read.scenario;
-  JsonObject object(document);
-  const JsonPlaced format = object.required("format");
-  if (format.text() != kFormat) format.fail("expected \"" + std::string(kFormat) + '"');
-  scenario.preferences = optionalPreferences(object).value_or(PreferenceChanges());
-  scenario.internalBuild = optionalBoolean(object, "internalBuild").value_or(false);
-  scenario.metric = optionalBoolean(object, "metric").value_or(true);
-  scenario.locked = optionalBoolean(object, "locked").value_or(false);
-  readHomes(object, read);
-  for (const JsonPlaced& step : object.required("steps").array()) {
-    scenario.steps.push_back(stepFromJson(step));
+  void beginObject(const JsonPath& path) override {
+    if (isHome(path)) homes_ = makeHomeDocumentEvents(read_.scenario.homes);
+    if (isSteps(path)) throw JsonError{path.place(), "expected an array"};
+    receiver(path).beginObject(path);
   }
-  object.refuseUnknownKeys();
-  return read;
-}
+
+  void key(std::string_view key, const JsonPath& path) override {
+    if (isMember(path)) key_ = key;
+    receiver(path).key(key, path);
+  }
+
+  void endObject(const JsonPath& path) override {
+    receiver(path).endObject(path);
+    endValue(path);
+  }
+
+  void beginArray(const JsonPath& path) override {
+    if (isHome(path)) failHome(path);
+    receiver(path).beginArray(path);
+  }
+
+  void endArray(const JsonPath& path) override {
+    receiver(path).endArray(path);
+    endValue(path);
+  }
+
+  /// What has been read, once all of it has.
+  [[nodiscard]] ReadScenario finish() {
+    const JsonValue value = rest_.take();
+    JsonObject object(JsonPlaced(value, ""));
+    checkFormat(object.required("format"));
+    Scenario& scenario = read_.scenario;
+    scenario.preferences = preferencesFromJson(object).value_or(PreferenceChanges());
+    scenario.internalBuild = optionalBoolean(object, "internalBuild").value_or(false);
+    scenario.metric = optionalBoolean(object, "metric").value_or(true);
+    scenario.locked = optionalBoolean(object, "locked").value_or(false);
+    finishHomes(object);
+    (void)object.required("steps").array();
+    object.refuseUnknownKeys();
+    return std::move(read_);
+  }
+
+ private:
+  /// Whether the value at `path` is the whole scenario's own.
+  static bool isMember(const JsonPath& path) { return path.depth() == 1; }
+  [[nodiscard]] bool isHome(const JsonPath& path) const { return isMember(path) && key_ == "home"; }
+  [[nodiscard]] bool isSteps(const JsonPath& path) const {
+    return isMember(path) && key_ == "steps";
+  }
+  [[nodiscard]] bool isWithinSteps(const JsonPath& path) const {
+    return path.depth() > 1 && key_ == "steps";
+  }
+  [[nodiscard]] bool isWithinHomes(const JsonPath& path) const {
+    return path.depth() > 0 && key_ == "home" && homes_;
+  }
+
+  [[noreturn]] static void failHome(const JsonPath& path) {
+    throw JsonError{path.place(), "expected an object"};
+  }
+
+  JsonEvents& receiver(const JsonPath& path) {
+    if (isWithinSteps(path)) return steps_;
+    return isWithinHomes(path) ? *homes_ : rest_;
+  }
+
+  void endValue(const JsonPath& path) {
+    constexpr std::size_t kDepthOfStep = 2;
+    if (!isWithinSteps(path) || path.depth() != kDepthOfStep) return;
+    const JsonValue value = steps_.take();
+    read_.scenario.steps.push_back(stepFromJson(JsonPlaced(value, path.place())));
+  }
+
+  void finishHomes(JsonObject& object) {
+    object.allow("home");
+    const auto homeFile = object.optional("homeFile");
+    if ((homes_ != nullptr) == homeFile.has_value()) {
+      object.placed().fail("expected exactly one of the keys \"home\", \"homeFile\"");
+    }
+    if (homeFile) read_.homeFile = homeFile->text();
+  }
+
+  ReadScenario read_;
+  std::string key_;                    ///< The key of the scenario whose value is read.
+  std::unique_ptr<JsonEvents> homes_;  ///< Once there are homes.
+  JsonBuilder steps_{kScenarioLimits.valuesInMemory};
+  JsonBuilder rest_{kScenarioLimits.valuesInMemory};
+};
 
 Result<ReadScenario> readScenarioFile(const std::filesystem::path& file) {
   auto in = openInput(file);
   if (!in) return in.failure();
-  const auto text = readAll(*in, file.string());
-  if (!text) return text.failure();
   try {
-    const JsonValue document = parseJson(*text);
-    return scenarioFromJson(JsonPlaced(document, ""));
+    ScenarioEvents events;
+    readJson(*in, events, kScenarioLimits);
+    return events.finish();
   } catch (const JsonError& error) {
     return failureOf(error, file.string());
   }

@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <csignal>
 #include <memory>
+#include <new>
 #include <utility>
 #include <vector>
 
@@ -146,7 +147,13 @@ ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
   } catch (const CLI::ParseError& error) {
     return reportUsage(usageErrorOf(app, error), place);
   }
-  return chosen();
+  try {
+    return chosen();
+  } catch (const std::bad_alloc&) {
+    return report({Failure::Kind::platform,
+                   "there is not enough memory for this; give the program more of it, or less to "
+                   "read"});
+  }
 }
 
 }  // namespace

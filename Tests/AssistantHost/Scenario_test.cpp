@@ -134,6 +134,18 @@ TEST_F(ScenarioTest, RefusesAFolder) {
   EXPECT_EQ(scenario.failure().kind, Failure::Kind::badInput);
 }
 
+TEST_F(ScenarioTest, ReadsHomesAfterTheSteps) {
+  const auto scenario = read(
+      R"({"steps": [{"records": {}}], "format": "nidus-scenario/1", "home": {"homes": [
+          {"uuid": "AA00AA00-0000-4000-8000-000000000001", "name": "Cottage"}],
+          "format": "nidus-home/1"}, "locked": true})");
+  ASSERT_TRUE(scenario) << scenario.failure().message;
+  EXPECT_EQ(scenario->steps.size(), 1U);
+  ASSERT_EQ(scenario->homes.size(), 1U);
+  EXPECT_EQ(scenario->homes[0].name, "Cottage");
+  EXPECT_TRUE(scenario->locked);
+}
+
 struct BadScenario {
   const char* label;
   std::string text;
@@ -153,11 +165,24 @@ TEST_F(ScenarioTest, NamesThePlaceOfWhatIsWrong) {
       {"bad home",
        R"({"format": "nidus-scenario/1", "home": {"format": "nidus-home/1"}, "steps": []})",
        "/home"},
+      {"bad room of the home",
+       R"({"format": "nidus-scenario/1", "steps": [], "home": {"format": "nidus-home/1", "homes": [
+           {"uuid": "AA00AA00-0000-4000-8000-000000000001", "name": "Cottage",
+            "rooms": [{"uuid": "AA00AA00-0000-4000-8000-000000000002"}]}]}})",
+       "/home/homes/0/rooms/0: missing required key"},
+      {"home no object", R"({"format": "nidus-scenario/1", "home": [], "steps": []})", "/home"},
+      {"home a text", R"({"format": "nidus-scenario/1", "home": "a", "steps": []})", "/home"},
+      {"null home", R"({"format": "nidus-scenario/1", "home": null, "steps": []})",
+       "expected exactly one"},
+      {"null steps", scenarioWith(R"("steps": null)"), "/steps"},
+      {"object among the lists", R"([{"steps": {"home": [0, {}]}}])", "expected an object"},
       {"no steps", scenarioWith(R"("metric": true)"), ""},
       {"steps no list", scenarioWith(R"("steps": {})"), "/steps"},
       {"unknown key", scenarioWith(R"("more": 1, "steps": [])"), "/more"},
       {"metric no boolean", scenarioWith(R"("metric": 1, "steps": [])"), "/metric"},
       {"preferences no object", scenarioWith(R"("preferences": [], "steps": [])"), "/preferences"},
+      {"number as a step", scenarioOf("{\"records\": {}}, 1"), "/steps/1"},
+      {"list as a step", scenarioOf("[[]]"), "/steps/0"},
       {"step of no kind", scenarioOf("{}"), "/steps/0"},
       {"step of two kinds", scenarioOf(R"({"records": {}, "export": {}})"), "/steps/0"},
       {"step of an unknown kind", scenarioOf(R"({"dance": {}})"), "/steps/0"},

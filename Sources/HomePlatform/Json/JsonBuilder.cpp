@@ -28,14 +28,14 @@ void JsonBuilder::beginArray(const JsonPath& path) {
 void JsonBuilder::endArray(const JsonPath& /*path*/) { close(); }
 
 JsonValue JsonBuilder::take() {
-  count_ = 0;
   isComplete_ = false;
   return std::exchange(root_, {});
 }
 
 void JsonBuilder::countValue(const JsonPath& path) {
   if (++count_ > maximumValues_) {
-    throw JsonError{path.place(), "there are too many values here"};
+    throw JsonError{path.place(),
+                    "there are more than " + std::to_string(maximumValues_) + " values here"};
   }
 }
 

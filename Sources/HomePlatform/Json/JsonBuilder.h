@@ -32,7 +32,7 @@ class JsonBuilder final : public JsonEvents {
 
   /// Whether one whole value has been put together.
   [[nodiscard]] bool isComplete() const noexcept { return isComplete_; }
-  /// Gives the value away and starts anew.
+  /// Gives the value away and starts anew; what was given away still counts.
   [[nodiscard]] JsonValue take();
 
  private:

@@ -18,7 +18,11 @@ void appendPointerStep(std::string& place, std::string_view key) {
 std::string JsonPath::place() const {
   std::string place = base_;
   for (const Step& step : steps_) {
-    appendPointerStep(place, step.isArray ? std::to_string(step.index) : step.key);
+    if (step.isArray) {
+      appendPointerStep(place, std::to_string(step.index));
+    } else if (step.isNamed) {
+      appendPointerStep(place, step.key);
+    }
   }
   return place;
 }

@@ -17,26 +17,39 @@ class JsonPath {
   /// `base` is the pointer of the value that is read, empty for a whole document.
   explicit JsonPath(std::string base = {}) : base_(std::move(base)) {}
 
-  void enterObject() { steps_.push_back({.key = {}, .index = 0, .isArray = false}); }
-  void enterArray() { steps_.push_back({.key = {}, .index = 0, .isArray = true}); }
+  void enterObject() { steps_.emplace_back(); }
+  void enterArray() { steps_.emplace_back().isArray = true; }
   void leave() { steps_.pop_back(); }
   /// The next value belongs to `key` of the innermost object.
-  void setKey(std::string_view key) { steps_.back().key = key; }
-  /// A value has ended; in an array the next one follows.
+  void setKey(std::string_view key) {
+    steps_.back().key = key;
+    steps_.back().isNamed = true;
+  }
+  /// A value has ended; in an array the next one follows, in an object the next key.
   void endValue() {
-    if (!steps_.empty()) ++steps_.back().index;
+    if (steps_.empty()) return;
+    ++steps_.back().index;
+    steps_.back().isNamed = false;
   }
 
   /// The number of objects and arrays that are open.
   [[nodiscard]] std::size_t depth() const noexcept { return steps_.size(); }
-  /// The pointer of the value that comes next, or of the object or array that has just ended.
+  /// Whether the innermost of them is an array.
+  [[nodiscard]] bool isInArray() const noexcept { return !steps_.empty() && steps_.back().isArray; }
+  /// How many values have ended within the innermost one.
+  [[nodiscard]] std::size_t index() const noexcept {
+    return steps_.empty() ? 0 : steps_.back().index;
+  }
+  /// The pointer of the value that comes next, or of the object or array that has just ended; that
+  /// of the object where a key comes next.
   [[nodiscard]] std::string place() const;
 
  private:
   struct Step {
     std::string key;
-    std::size_t index;
-    bool isArray;
+    std::size_t index = 0;
+    bool isArray = false;
+    bool isNamed = false;  ///< Whether the next value has its key.
   };
   std::string base_;
   std::vector<Step> steps_;

@@ -10,10 +10,12 @@
 #include <system_error>
 #include <unordered_set>
 
+#include "HomePlatform/Json/JsonByteCheck.h"
+
 namespace nidus {
 namespace {
 
-/// Bytes on their way into the parser, which would take a zero byte for the end of the text.
+/// Bytes on their way into the parser, each seen by the check first.
 template <class Base>
 class CheckedBytes {
  public:
@@ -23,16 +25,15 @@ class CheckedBytes {
   using pointer = const char*;
   using reference = char;
 
-  explicit CheckedBytes(Base base) : base_(base) {}
+  CheckedBytes(Base base, JsonByteCheck& check) : base_(base), check_(&check) {}
 
   char operator*() const {
     const char byte = *base_;
-    if (byte == '\0') throw JsonError{"", "byte " + std::to_string(position_) + ": zero byte"};
+    check_->take(byte);
     return byte;
   }
   CheckedBytes& operator++() {
     ++base_;
-    ++position_;
     return *this;
   }
   friend bool operator==(const CheckedBytes& a, const CheckedBytes& b) {
@@ -42,7 +43,7 @@ class CheckedBytes {
 
  private:
   Base base_;
-  std::size_t position_ = 1;
+  JsonByteCheck* check_;
 };
 
 /// The keys that one object has had so far. Nearly all objects have a handful, for which a plain
@@ -87,7 +88,8 @@ class CheckingHandler {
   using string_t = nlohmann::json::string_t;
   using binary_t = nlohmann::json::binary_t;
 
-  explicit CheckingHandler(JsonEvents& events) : events_(events) {}
+  CheckingHandler(JsonEvents& events, const JsonLimits& limits, JsonPath& path)
+      : events_(events), limits_(limits), path_(path) {}
 
   // NOLINTBEGIN(readability-identifier-naming): the parser calls these by its own names
   bool null() { return scalar({nullptr}); }
@@ -111,6 +113,7 @@ class CheckingHandler {
   bool binary(binary_t&) { return false; }
 
   bool start_object(std::size_t) {
+    beginValue();
     checkDepth();
     events_.beginObject(path_);
     path_.enterObject();
@@ -118,6 +121,7 @@ class CheckingHandler {
     return true;
   }
   bool key(string_t& key) {
+    checkKey(key);
     path_.setKey(key);
     if (!openObjects_.back().add(key)) throw JsonError{path_.place(), "the key stands twice"};
     events_.key(key, path_);
@@ -131,6 +135,7 @@ class CheckingHandler {
     return true;
   }
   bool start_array(std::size_t) {
+    beginValue();
     checkDepth();
     events_.beginArray(path_);
     path_.enterArray();
@@ -161,17 +166,29 @@ class CheckingHandler {
   [[nodiscard]] bool isComplete() const { return !isEmpty_ && path_.depth() == 0; }
 
   bool scalar(JsonValue value) {
-    isEmpty_ = false;
+    beginValue();
     events_.scalar(std::move(value), path_);
     path_.endValue();
     return true;
   }
 
-  void checkDepth() {
+  void beginValue() {
     isEmpty_ = false;
-    if (path_.depth() < kJsonMaximumDepth) return;
-    throw JsonError{path_.place(),
-                    "nested deeper than " + std::to_string(kJsonMaximumDepth) + " levels"};
+    if (!path_.isInArray() || path_.index() < limits_.arrayElements) return;
+    fail("an array has at most " + std::to_string(limits_.arrayElements) + " elements");
+  }
+
+  void checkKey(const std::string& key) const {
+    if (key.size() > limits_.keyBytes) {
+      fail("a key is longer than " + std::to_string(limits_.keyBytes) + " bytes");
+    }
+    if (path_.index() < limits_.objectKeys) return;
+    fail("an object has at most " + std::to_string(limits_.objectKeys) + " keys");
+  }
+
+  void checkDepth() const {
+    if (path_.depth() < limits_.depth) return;
+    fail("nested deeper than " + std::to_string(limits_.depth) + " levels");
   }
 
   [[nodiscard]] float nearestFloat(const std::string& text, double roughly) const {
@@ -183,80 +200,42 @@ class CheckingHandler {
   }
 
   [[noreturn]] void failBeyondRange(bool isInteger) const {
-    throw JsonError{path_.place(), isInteger ? "the integer is beyond 64 bits"
-                                             : "the number is beyond the range of a 32-bit float"};
+    fail(isInteger ? "the integer is beyond 64 bits"
+                   : "the number is beyond the range of a 32-bit float");
+  }
+
+  [[noreturn]] void fail(const std::string& message) const {
+    throw JsonError{path_.place(), message};
   }
 
   JsonEvents& events_;
-  JsonPath path_;
+  const JsonLimits& limits_;
+  JsonPath& path_;
   std::vector<SeenKeys> openObjects_;
   bool isEmpty_ = true;
 };
 
 template <class Bytes>
-void readBytes(Bytes begin, Bytes end, JsonEvents& events) {
-  CheckingHandler handler(events);
-  nlohmann::json::sax_parse(CheckedBytes(begin), CheckedBytes(end), &handler);
+void readBytes(Bytes begin, Bytes end, JsonEvents& events, const JsonLimits& limits) {
+  JsonPath path;
+  JsonByteCheck check(limits, path);
+  CheckingHandler handler(events, limits, path);
+  nlohmann::json::sax_parse(CheckedBytes(begin, check), CheckedBytes(end, check), &handler);
 }
-
-/// Walks a value that is in memory.
-class Replay {
- public:
-  Replay(const std::string& base, JsonEvents& events) : events_(events), path_(base) {}
-
-  void pass(const JsonValue& value) {
-    if (const auto* object = std::get_if<JsonValue::Object>(&value.content)) {
-      passObject(*object);
-    } else if (const auto* array = std::get_if<JsonValue::Array>(&value.content)) {
-      passArray(*array);
-    } else {
-      events_.scalar(value, path_);
-    }
-    path_.endValue();
-  }
-
- private:
-  void passObject(const JsonValue::Object& object) {
-    events_.beginObject(path_);
-    path_.enterObject();
-    for (const auto& [key, value] : object) {
-      path_.setKey(key);
-      events_.key(key, path_);
-      pass(value);
-    }
-    path_.leave();
-    events_.endObject(path_);
-  }
-
-  void passArray(const JsonValue::Array& array) {
-    events_.beginArray(path_);
-    path_.enterArray();
-    for (const JsonValue& element : array) pass(element);
-    path_.leave();
-    events_.endArray(path_);
-  }
-
-  JsonEvents& events_;
-  JsonPath path_;
-};
 
 }  // namespace
 
-void readJson(std::string_view text, JsonEvents& events) {
-  readBytes(text.data(), text.data() + text.size(), events);
+void readJson(std::string_view text, JsonEvents& events, const JsonLimits& limits) {
+  readBytes(text.data(), text.data() + text.size(), events, limits);
 }
 
-void readJson(std::istream& in, JsonEvents& events) {
+void readJson(std::istream& in, JsonEvents& events, const JsonLimits& limits) {
   if (!in) throw JsonError{"", "cannot be read"};
   try {
-    readBytes(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>(), events);
+    readBytes(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>(), events, limits);
   } catch (const std::ios_base::failure& failure) {
     throw JsonError{"", "cannot be read: " + failure.code().message()};
   }
-}
-
-void replayJson(const JsonPlaced& value, JsonEvents& events) {
-  Replay(value.place(), events).pass(value.value());
 }
 
 }  // namespace nidus

@@ -4,7 +4,7 @@
 #include <string>
 #include <string_view>
 
-#include "HomePlatform/Json/JsonObject.h"
+#include "HomePlatform/Json/JsonLimits.h"
 #include "HomePlatform/Json/JsonPath.h"
 #include "HomePlatform/Json/JsonValue.h"
 
@@ -28,12 +28,9 @@ class JsonEvents {
   virtual void endArray(const JsonPath& path) = 0;
 };
 
-/// Reads one JSON text, with all checks of `parseJson`, and passes it on as events. Nothing is kept
-/// but the keys of the objects that are open. Throws `JsonError`.
-void readJson(std::string_view text, JsonEvents& events);
-void readJson(std::istream& in, JsonEvents& events);
-
-/// Passes on a value that has been read before.
-void replayJson(const JsonPlaced& value, JsonEvents& events);
+/// Reads one JSON text, with all checks of `parseJson` but that of `valuesInMemory`, and passes it
+/// on as events. Nothing is kept but the keys of the objects that are open. Throws `JsonError`.
+void readJson(std::string_view text, JsonEvents& events, const JsonLimits& limits = {});
+void readJson(std::istream& in, JsonEvents& events, const JsonLimits& limits = {});
 
 }  // namespace nidus

@@ -2,12 +2,14 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <iosfwd>
 #include <string>
 #include <string_view>
 #include <utility>
 #include <variant>
 #include <vector>
 
+#include "HomePlatform/Json/JsonLimits.h"
 #include "HomePlatform/Result.h"
 
 namespace nidus {
@@ -35,9 +37,9 @@ struct JsonError {
 
 /// Reads one JSON text whole. Strict: throws `JsonError` for anything but one value of valid UTF-8,
 /// for a key that stands twice, an integer beyond 64 bits, a float beyond 32-bit range, and for
-/// nesting beyond `kJsonMaximumDepth`. A number that is too small for a float becomes 0.0; a byte
+/// what is beyond one of the `limits`. A number that is too small for a float becomes 0.0; a byte
 /// order mark before the text is passed over. The message of a syntax error names line and column.
-inline constexpr std::size_t kJsonMaximumDepth = 64;
-[[nodiscard]] JsonValue parseJson(std::string_view text);
+[[nodiscard]] JsonValue parseJson(std::string_view text, const JsonLimits& limits = {});
+[[nodiscard]] JsonValue parseJson(std::istream& in, const JsonLimits& limits = {});
 
 }  // namespace nidus

@@ -2,7 +2,6 @@
 
 #include <cerrno>
 #include <fstream>
-#include <sstream>
 #include <system_error>
 #include <unordered_map>
 #include <unordered_set>
@@ -16,8 +15,6 @@ namespace nidus {
 extern const std::string_view kBuiltInVocabulary;
 
 namespace {
-
-constexpr std::size_t kGreatestSize = std::size_t{16} << 20;
 
 NDString optionalText(JsonObject& object, std::string_view key) {
   const auto placed = object.optional(key);
@@ -145,8 +142,7 @@ void mergeList(JsonObject& document, std::string_view key, std::vector<Entry>& l
   if (const auto entries = document.optional(key)) ListMerge<Entry>(list).merge(*entries);
 }
 
-Vocabulary merge(Vocabulary vocabulary, std::string_view text) {
-  const JsonValue value = parseJson(text);
+Vocabulary merge(Vocabulary vocabulary, const JsonValue& value) {
   JsonObject document(JsonPlaced(value, ""));
   const JsonPlaced format = document.required("format");
   if (format.text() != kVocabularyFormat) {
@@ -165,32 +161,26 @@ Failure readFailure(const std::filesystem::path& path, int error) {
                                        "; mend its permissions or remove it"};
 }
 
-/// The text of a file; none when it is missing.
-Result<std::optional<std::string>> readFile(const std::filesystem::path& path) {
-  errno = 0;
-  std::ifstream file(path, std::ios::binary);
-  if (!file && errno == ENOENT) return std::optional<std::string>();
-  if (!file) return readFailure(path, errno);
-  std::string text;
-  char block[4096];
-  while (file.read(block, sizeof block) || file.gcount() > 0) {
-    text.append(block, static_cast<std::size_t>(file.gcount()));
-    if (text.size() > kGreatestSize) {
-      return failureOf({"", "a vocabulary has at most 16 MiB"}, path.string());
-    }
+/// The built-in vocabulary extended by what `file` holds.
+Result<Vocabulary> extendBuiltIn(std::istream& file, const std::filesystem::path& path) {
+  try {
+    const JsonValue document = parseJson(file, kVocabularyLimits);
+    return merge(builtInVocabulary(), document);
+  } catch (const JsonError& error) {
+    Failure failure = failureOf(error, path.string());
+    failure.message += "; correct the file or remove it";
+    return failure;
   }
-  if (file.bad()) return readFailure(path, EIO);
-  return std::optional<std::string>(std::move(text));
 }
 
 }  // namespace
 
-Vocabulary builtInVocabulary() { return merge({}, kBuiltInVocabulary); }
+Vocabulary builtInVocabulary() { return merge({}, parseJson(kBuiltInVocabulary)); }
 
 Result<Vocabulary> mergeVocabulary(Vocabulary base, std::string_view text,
                                    const std::string& name) {
   try {
-    return merge(std::move(base), text);
+    return merge(std::move(base), parseJson(text, kVocabularyLimits));
   } catch (const JsonError& error) {
     return failureOf(error, name);
   }
@@ -198,14 +188,11 @@ Result<Vocabulary> mergeVocabulary(Vocabulary base, std::string_view text,
 
 Result<Vocabulary> loadVocabulary(const std::optional<std::filesystem::path>& path) {
   if (!path) return builtInVocabulary();
-  Result<std::optional<std::string>> text = readFile(*path);
-  if (!text) return text.failure();
-  if (!*text) return builtInVocabulary();
-  Result<Vocabulary> merged = mergeVocabulary(builtInVocabulary(), **text, path->string());
-  if (merged) return merged;
-  Failure failure = merged.failure();
-  failure.message += "; correct the file or remove it";
-  return failure;
+  errno = 0;
+  std::ifstream file(*path, std::ios::binary);
+  if (!file && errno == ENOENT) return builtInVocabulary();
+  if (!file) return readFailure(*path, errno);
+  return extendBuiltIn(file, *path);
 }
 
 }  // namespace nidus

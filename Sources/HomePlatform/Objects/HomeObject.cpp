@@ -78,11 +78,4 @@ void HomeObject::takeValues(const HomeObject& newer) const {
   }
 }
 
-std::size_t HomeObject::HashUUID::operator()(const NDUUID& uuid) const noexcept {
-  std::uint64_t halves[2];
-  static_assert(sizeof halves == sizeof uuid.bytes());
-  std::memcpy(halves, uuid.bytes().data(), sizeof halves);
-  return (halves[0] ^ (halves[1] >> 32U)) * 0x9E3779B97F4A7C15U ^ halves[1];
-}
-
 }  // namespace nidus

@@ -59,10 +59,6 @@ class HomeObject final : public NDHome {
 
  private:
   friend class HomeBuilding;
-  struct HashUUID {
-    std::size_t operator()(const NDUUID& uuid) const noexcept;
-  };
-
   const std::shared_ptr<const HomeData> data_;
   const std::weak_ptr<HomeCalls> calls_;
   // Complete when `make` returns.
@@ -73,7 +69,7 @@ class HomeObject final : public NDHome {
   NDArray<NDServiceGroup> groups_;
   NDArray<NDActionSet> actionSets_;
   NDArray<NDTrigger> triggers_;
-  std::unordered_map<NDUUID, const AccessoryObject*, HashUUID> accessoriesByID_;
+  std::unordered_map<NDUUID, const AccessoryObject*> accessoriesByID_;
 };
 
 }  // namespace nidus

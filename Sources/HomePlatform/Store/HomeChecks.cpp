@@ -27,6 +27,44 @@ struct Element {
 
 std::string text(const NDUUID& uuid) { return uuid.UUIDString().str(); }
 
+/// Addresses that are referred to, and which of them lead somewhere: it costs memory for each
+/// reference, not for each of the many things that could be referred to.
+template <class Address>
+class References {
+ public:
+  void add(const Address& address) { wanted_.push_back(address); }
+  /// Ends the adding.
+  void sort() {
+    std::sort(wanted_.begin(), wanted_.end());
+    wanted_.erase(std::unique(wanted_.begin(), wanted_.end()), wanted_.end());
+    found_.assign(wanted_.size(), false);
+  }
+  void find(const Address& address) {
+    const std::size_t index = indexOf(address);
+    if (index < wanted_.size()) found_[index] = true;
+  }
+  /// `address` has been added.
+  [[nodiscard]] bool isFound(const Address& address) const { return found_[indexOf(address)]; }
+
+ private:
+  /// The number of all for an address that nobody refers to.
+  [[nodiscard]] std::size_t indexOf(const Address& address) const {
+    const auto place = std::lower_bound(wanted_.begin(), wanted_.end(), address);
+    const bool isWanted = place != wanted_.end() && *place == address;
+    return static_cast<std::size_t>((isWanted ? place : wanted_.end()) - wanted_.begin());
+  }
+
+  std::vector<Address> wanted_;
+  std::vector<bool> found_;
+};
+
+/// Sorts `numbers` and says whether one stands twice: quick for the few of most accessories, and
+/// for many that somebody chose to be slow to look up.
+bool hasRepetition(std::vector<std::int64_t>& numbers) {
+  std::sort(numbers.begin(), numbers.end());
+  return std::adjacent_find(numbers.begin(), numbers.end()) != numbers.end();
+}
+
 /// One home's check: the indices that references are looked up in, and a step for each kind of
 /// part.
 class HomeCheck {
@@ -38,7 +76,7 @@ class HomeCheck {
     for (std::size_t i = 0; i < home_.accessories.size(); ++i) checkAccessory(i);
     for (std::size_t i = 0; i < home_.zones.size(); ++i) checkZone(i);
     if (home_.serviceGroups.empty() && home_.actionSets.empty()) return;
-    indexServices();
+    findReferences();
     for (std::size_t i = 0; i < home_.serviceGroups.size(); ++i) checkServiceGroup(i);
     for (std::size_t i = 0; i < home_.actionSets.size(); ++i) checkActionSet(i);
   }
@@ -69,33 +107,52 @@ class HomeCheck {
     if (rooms_.count(room) == 0) fail(place, "no room of this home has the UUID " + text(room));
   }
 
-  void checkAccessory(std::size_t index) const {
+  void checkAccessory(std::size_t index) {
     const AccessoryData& accessory = home_.accessories[index];
     const std::string place = Element{place_, "accessories", index}.place();
     if (accessory.room) checkRoom(*accessory.room, place + "/room");
-    std::unordered_set<std::int64_t> services;
-    std::unordered_set<std::int64_t> characteristics;
+    services_.clear();
+    characteristics_.clear();
+    for (const ServiceData& service : accessory.services) {
+      services_.push_back(service.instanceID);
+      for (const CharacteristicData& characteristic : service.characteristics) {
+        characteristics_.push_back(characteristic.instanceID);
+      }
+    }
+    const bool isRepeated = hasRepetition(services_) || hasRepetition(characteristics_);
+    if (isRepeated) failAtRepetition(accessory, place);
+    checkProperties(accessory, place);
+  }
+
+  /// Fails at the first instance ID that another service or characteristic has.
+  static void failAtRepetition(const AccessoryData& accessory, const std::string& place) {
+    std::set<std::int64_t> services;
+    std::set<std::int64_t> characteristics;
     for (std::size_t i = 0; i < accessory.services.size(); ++i) {
       const ServiceData& service = accessory.services[i];
-      if (!services.insert(service.instanceID).second) {
-        fail(Element{place, "services", i}.place() + "/instanceID",
-             "another service of this accessory has the instance ID " +
-                 std::to_string(service.instanceID));
+      const Element element{place, "services", i};
+      addInstanceID(service.instanceID, "service", element, services);
+      const std::string servicePlace = element.place();
+      for (std::size_t k = 0; k < service.characteristics.size(); ++k) {
+        addInstanceID(service.characteristics[k].instanceID, "characteristic",
+                      {servicePlace, "characteristics", k}, characteristics);
       }
-      checkCharacteristics(service, {place, "services", i}, characteristics);
     }
   }
 
-  static void checkCharacteristics(const ServiceData& service, const Element& element,
-                                   std::unordered_set<std::int64_t>& known) {
-    for (std::size_t i = 0; i < service.characteristics.size(); ++i) {
-      const CharacteristicData& characteristic = service.characteristics[i];
-      if (!known.insert(characteristic.instanceID).second) {
-        fail(Element{element.place(), "characteristics", i}.place() + "/instanceID",
-             "another characteristic of this accessory has the instance ID " +
-                 std::to_string(characteristic.instanceID));
+  static void addInstanceID(std::int64_t id, const std::string& kind, const Element& element,
+                            std::set<std::int64_t>& known) {
+    if (known.insert(id).second) return;
+    fail(element.place() + "/instanceID",
+         "another " + kind + " of this accessory has the instance ID " + std::to_string(id));
+  }
+
+  static void checkProperties(const AccessoryData& accessory, const std::string& place) {
+    for (std::size_t i = 0; i < accessory.services.size(); ++i) {
+      const auto& characteristics = accessory.services[i].characteristics;
+      for (std::size_t k = 0; k < characteristics.size(); ++k) {
+        checkProperties(characteristics[k].properties, {place, "services", i}, k);
       }
-      checkProperties(characteristic.properties, element, i);
     }
   }
 
@@ -117,25 +174,31 @@ class HomeCheck {
     }
   }
 
-  void indexServices() {
-    for (const AccessoryData& accessory : home_.accessories) {
-      accessories_.insert(accessory.uuid);
-      for (const ServiceData& service : accessory.services) {
-        services_.push_back({accessory.uuid, service.instanceID});
-        if (home_.actionSets.empty()) continue;
-        for (const CharacteristicData& characteristic : service.characteristics) {
-          characteristics_.push_back(
-              {accessory.uuid, service.instanceID, characteristic.instanceID});
-        }
-      }
+  /// Collects what groups and scenes refer to, and finds what of it is there.
+  void findReferences() {
+    for (const ServiceGroupData& group : home_.serviceGroups) {
+      for (const ServiceAddress& service : group.services) groupedServices_.add(service);
     }
-    std::sort(services_.begin(), services_.end());
-    std::sort(characteristics_.begin(), characteristics_.end());
+    for (const ActionSetData& actionSet : home_.actionSets) {
+      for (const SceneActionData& action : actionSet.actions) targets_.add(action.target);
+    }
+    groupedServices_.sort();
+    targets_.sort();
+    for (const AccessoryData& accessory : home_.accessories) findReferences(accessory);
   }
 
-  void checkService(const ServiceAddress& address, const Element& element) const {
-    if (std::binary_search(services_.begin(), services_.end(), address)) return;
-    if (accessories_.count(address.accessory) == 0) {
+  void findReferences(const AccessoryData& accessory) {
+    for (const ServiceData& service : accessory.services) {
+      groupedServices_.find({accessory.uuid, service.instanceID});
+      for (const CharacteristicData& characteristic : service.characteristics) {
+        targets_.find({accessory.uuid, service.instanceID, characteristic.instanceID});
+      }
+    }
+  }
+
+  /// Fails for a service that is not there.
+  [[noreturn]] void failAtService(const ServiceAddress& address, const Element& element) const {
+    if (!accessoryOf(address.accessory)) {
       fail(element.place() + "/accessory",
            "no accessory of this home has the UUID " + text(address.accessory));
     }
@@ -150,7 +213,7 @@ class HomeCheck {
     std::set<ServiceAddress> known;
     for (std::size_t i = 0; i < services.size(); ++i) {
       const Element element{place, "services", i};
-      checkService(services[i], element);
+      if (!groupedServices_.isFound(services[i])) failAtService(services[i], element);
       if (!known.insert(services[i]).second) fail(element.place(), "the service is listed twice");
     }
   }
@@ -160,22 +223,39 @@ class HomeCheck {
     const std::vector<SceneActionData>& actions = home_.actionSets[index].actions;
     for (std::size_t i = 0; i < actions.size(); ++i) {
       const CharacteristicAddress& target = actions[i].target;
-      if (std::binary_search(characteristics_.begin(), characteristics_.end(), target)) continue;
-      const Element element{place, "actions", i};
-      checkService({target.accessory, target.service}, element);
-      fail(element.place() + "/characteristic", "the service " + std::to_string(target.service) +
-                                                    " of the accessory " + text(target.accessory) +
-                                                    " has no characteristic with the instance ID " +
-                                                    std::to_string(target.characteristic));
+      if (!targets_.isFound(target)) failAtTarget(target, {place, "actions", i});
     }
+  }
+
+  [[noreturn]] void failAtTarget(const CharacteristicAddress& target,
+                                 const Element& element) const {
+    const AccessoryData* accessory = accessoryOf(target.accessory);
+    const auto isService = [&target](const auto& one) { return one.instanceID == target.service; };
+    if (!accessory ||
+        std::none_of(accessory->services.begin(), accessory->services.end(), isService)) {
+      failAtService({target.accessory, target.service}, element);
+    }
+    fail(element.place() + "/characteristic", "the service " + std::to_string(target.service) +
+                                                  " of the accessory " + text(target.accessory) +
+                                                  " has no characteristic with the instance ID " +
+                                                  std::to_string(target.characteristic));
+  }
+
+  [[nodiscard]] const AccessoryData* accessoryOf(const NDUUID& uuid) const {
+    const auto& accessories = home_.accessories;
+    const auto found =
+        std::find_if(accessories.begin(), accessories.end(),
+                     [&uuid](const AccessoryData& accessory) { return accessory.uuid == uuid; });
+    return found == accessories.end() ? nullptr : &*found;
   }
 
   const HomeData& home_;
   const std::string& place_;
   std::unordered_set<NDUUID> rooms_;
-  std::unordered_set<NDUUID> accessories_;
-  std::vector<ServiceAddress> services_;                ///< Sorted.
-  std::vector<CharacteristicAddress> characteristics_;  ///< Sorted.
+  References<ServiceAddress> groupedServices_;
+  References<CharacteristicAddress> targets_;
+  std::vector<std::int64_t> services_;         ///< The instance IDs of one accessory.
+  std::vector<std::int64_t> characteristics_;  ///< As above.
 };
 
 }  // namespace

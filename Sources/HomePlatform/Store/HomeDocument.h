@@ -1,10 +1,11 @@
 #pragma once
 
 #include <iosfwd>
+#include <memory>
 #include <string>
 #include <vector>
 
-#include "HomePlatform/Json/JsonObject.h"
+#include "HomePlatform/Json/JsonReader.h"
 #include "HomePlatform/Result.h"
 #include "HomePlatform/Store/HomeData.h"
 
@@ -17,9 +18,10 @@ namespace nidus {
 [[nodiscard]] Result<std::vector<HomeData>> readHomeDocument(std::istream& in,
                                                              const std::string& name);
 
-/// Reads a home document that is part of another document, with the same checks. Throws
+/// Makes a reader of a home document that is part of another document, with the same checks: it
+/// takes the events of that part and puts the homes into `homes`, which must outlive it. Throws
 /// `JsonError`, whose place is that in the outer document.
-[[nodiscard]] std::vector<HomeData> homesFromJson(const JsonPlaced& document);
+[[nodiscard]] std::unique_ptr<JsonEvents> makeHomeDocumentEvents(std::vector<HomeData>& homes);
 
 /// Writes a home document; keys that have their default are left out. With `indent` each part has a
 /// line of its own and the last one ends, otherwise all is on one line without a line end. Errors

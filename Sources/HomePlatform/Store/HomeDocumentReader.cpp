@@ -9,15 +9,12 @@
 namespace nidus {
 namespace {
 
-/// What one object may hold beside the lists that are read element by element: enough for a zone of
-/// a very large home, little enough to bound the memory that a wrong document costs.
-constexpr std::size_t kMaximumValuesOfPart = 200'000;
-
 /// Takes the events of a document and gives each object to a part reader of its own. Only what an
 /// object holds beside its lists is put together to a value, and dropped when the object ends.
 class DocumentEvents final : public JsonEvents {
  public:
-  explicit DocumentEvents(std::unique_ptr<HomePartReader> root) : root_(std::move(root)) {}
+  explicit DocumentEvents(std::vector<HomeData>& homes)
+      : root_(makeDocumentReader(homes, texts_)) {}
 
   void scalar(JsonValue value, const JsonPath& path) override {
     refuseUnlessValueFits(std::holds_alternative<std::nullptr_t>(value.content), path);
@@ -85,7 +82,7 @@ class DocumentEvents final : public JsonEvents {
  private:
   struct Part {
     std::unique_ptr<HomePartReader> reader;
-    JsonBuilder rest{kMaximumValuesOfPart};
+    JsonBuilder rest{kHomeDocumentLimits.valuesInMemory};
     std::string key;                             ///< The key whose value is read.
     const HomePartReader::List* list = nullptr;  ///< The list that `key` names, or null.
     bool isListOpen = false;                     ///< Whether its elements are read.
@@ -114,6 +111,7 @@ class DocumentEvents final : public JsonEvents {
     if (parts_.back().list && !isNull) throw JsonError{path.place(), "expected an array"};
   }
 
+  SharedTexts texts_;
   std::unique_ptr<HomePartReader> root_;
   std::vector<Part> parts_;
 };
@@ -122,22 +120,17 @@ class DocumentEvents final : public JsonEvents {
 
 Result<std::vector<HomeData>> readHomeDocument(std::istream& in, const std::string& name) {
   std::vector<HomeData> homes;
-  SharedTexts texts;
   try {
-    DocumentEvents events(makeDocumentReader(homes, texts));
-    readJson(in, events);
+    DocumentEvents events(homes);
+    readJson(in, events, kHomeDocumentLimits);
   } catch (const JsonError& error) {
     return failureOf(error, name);
   }
   return homes;
 }
 
-std::vector<HomeData> homesFromJson(const JsonPlaced& document) {
-  std::vector<HomeData> homes;
-  SharedTexts texts;
-  DocumentEvents events(makeDocumentReader(homes, texts));
-  replayJson(document, events);
-  return homes;
+std::unique_ptr<JsonEvents> makeHomeDocumentEvents(std::vector<HomeData>& homes) {
+  return std::make_unique<DocumentEvents>(homes);
 }
 
 }  // namespace nidus

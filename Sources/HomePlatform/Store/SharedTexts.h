@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <functional>
 #include <string_view>
 #include <unordered_set>
@@ -8,16 +9,20 @@
 
 namespace nidus {
 
-/// Keeps one copy of each text that many objects have in common, such as types and units. Not
-/// synchronised.
+/// Keeps one copy of each text that many objects have in common, such as types and units, up to a
+/// number that no home comes near. Not synchronised.
 class SharedTexts {
  public:
   [[nodiscard]] NDString text(std::string_view characters) {
     const auto known = texts_.find(characters);
-    return known != texts_.end() ? *known : *texts_.emplace(characters).first;
+    if (known != texts_.end()) return *known;
+    if (texts_.size() >= kMost) return {characters};
+    return *texts_.emplace(characters).first;
   }
 
  private:
+  static constexpr std::size_t kMost = 4096;
+
   struct Hash {
     using is_transparent = void;
     std::size_t operator()(std::string_view text) const {

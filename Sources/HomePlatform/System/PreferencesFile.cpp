@@ -16,8 +16,6 @@
 namespace nidus {
 namespace {
 
-constexpr std::size_t kGreatestSize = std::size_t{1} << 20;
-
 Failure fileFailure(const std::filesystem::path& path, const std::string& what, int error) {
   return {Failure::Kind::platform, path.string() + ": " + what + ": " +
                                        std::generic_category().message(error) +
@@ -32,7 +30,7 @@ Failure contentFailure(const std::filesystem::path& path, const JsonError& error
 
 Result<PreferencesContent> parse(const std::filesystem::path& path, std::string text) {
   try {
-    JsonValue document = parseJson(text);
+    JsonValue document = parseJson(text, kPreferencesLimits);
     auto* values = std::get_if<JsonValue::Object>(&document.content);
     if (!values) throw JsonError{"", "expected an object of preferences"};
     return PreferencesContent{std::move(*values), std::move(text)};
@@ -90,9 +88,7 @@ Result<PreferencesContent> PreferencesFile::read() const {
   char block[4096];
   while (file.read(block, sizeof block) || file.gcount() > 0) {
     text.append(block, static_cast<std::size_t>(file.gcount()));
-    if (text.size() > kGreatestSize) {
-      return contentFailure(path_, {"", "preferences have at most 1 MiB"});
-    }
+    if (text.size() > kPreferencesLimits.documentBytes) break;  // the parser says so
   }
   if (file.bad()) return fileFailure(path_, "the preferences cannot be read", EIO);
   return parse(path_, std::move(text));

@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <atomic>
+#include <bit>
 #include <cerrno>
 #include <system_error>
 
@@ -56,6 +57,13 @@ constexpr bool isDashPosition(std::size_t position) {
   return position == 8 || position == 13 || position == 18 || position == 23;
 }
 
+/// A bijection that makes each bit of the result depend on each bit of `value`.
+constexpr std::uint64_t mixed(std::uint64_t value) noexcept {
+  value = (value ^ value >> 33) * 0xFF51AFD7ED558CCD;
+  value = (value ^ value >> 33) * 0xC4CEB9FE1A85EC53;
+  return value ^ value >> 33;
+}
+
 /// The value of a hexadecimal digit, -1 for any other character.
 constexpr int digitValue(char digit) noexcept {
   if (digit >= '0' && digit <= '9') return digit - '0';
@@ -94,6 +102,12 @@ NDString NDUUID::UUIDString() const {
   std::array<char, kTextLength> text{};
   writeText(text.data());
   return {std::string_view(text.data(), text.size())};
+}
+
+std::size_t NDUUID::hash() const noexcept {
+  static const auto seed = std::bit_cast<std::array<std::uint64_t, 2>>(random().bytes());
+  const auto halves = std::bit_cast<std::array<std::uint64_t, 2>>(bytes_);
+  return mixed(mixed(halves[0] ^ seed[0]) ^ halves[1] ^ seed[1]);
 }
 
 void NDUUID::writeText(char* out) const noexcept {

@@ -38,6 +38,10 @@ class ND_EXPORT NDUUID {
   [[nodiscard]] constexpr const std::array<std::uint8_t, 16>& bytes() const noexcept {
     return bytes_;
   }
+  /// A number for look-ups, the same as long as the process lives. It differs from process to
+  /// process, so that nobody can think of UUIDs that make look-ups slow.
+  [[nodiscard]] std::size_t hash() const noexcept;
+
   // NOLINTNEXTLINE(modernize-use-nullptr): the check takes the default for a null pointer
   friend constexpr auto operator<=>(const NDUUID&, const NDUUID&) noexcept = default;
 
@@ -49,9 +53,5 @@ class ND_EXPORT NDUUID {
 
 template <>
 struct std::hash<nidus::NDUUID> {
-  std::size_t operator()(const nidus::NDUUID& uuid) const noexcept {
-    std::size_t mixed = 0;
-    for (const std::uint8_t byte : uuid.bytes()) mixed = mixed * 131 + byte;
-    return mixed;
-  }
+  std::size_t operator()(const nidus::NDUUID& uuid) const noexcept { return uuid.hash(); }
 };

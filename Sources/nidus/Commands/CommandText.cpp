@@ -11,7 +11,7 @@ namespace {
 
 bool isJson(std::string_view text) {
   try {
-    static_cast<void>(parseJson(text));
+    static_cast<void>(parseJson(text, kCommandLimits));
     return true;
   } catch (const JsonError&) {
     return false;

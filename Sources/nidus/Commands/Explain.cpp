@@ -21,10 +21,10 @@ struct ExplainInput {
 };
 
 Result<std::string> textOf(const std::string& file) {
-  if (file == "-") return readAll(std::cin, "standard input");
+  if (file == "-") return readUpTo(kBytesToJudge, std::cin, "standard input");
   auto in = openInput(file);
   if (!in) return in.failure();
-  return readAll(*in, file);
+  return readUpTo(kBytesToJudge, *in, file);
 }
 
 /// The command that is given itself, in a file or as its name says.

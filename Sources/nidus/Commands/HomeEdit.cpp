@@ -5,6 +5,7 @@
 #include <sstream>
 #include <utility>
 
+#include "AssistantHost/InputFile.h"
 #include "HomePlatform/Store/HomeDocument.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
@@ -28,11 +29,11 @@ std::string documentOf(const std::vector<HomeData>& homes) {
   return out.str();
 }
 
+/// As much of the file as a document may have, and a byte more if it has more.
 std::string contentOf(const std::filesystem::path& file) {
   std::ifstream in(file, std::ios::binary);
-  std::ostringstream content;
-  content << in.rdbuf();
-  return content.str();
+  auto content = readUpTo(kHomeDocumentLimits.documentBytes + 1, in, file.string());
+  return content ? std::move(*content) : std::string();
 }
 
 Result<std::vector<HomeData>> read(const std::string& document, const std::string& name) {

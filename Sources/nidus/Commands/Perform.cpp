@@ -1,11 +1,15 @@
 #include <algorithm>
 #include <cstddef>
 #include <iostream>
+#include <iterator>
 #include <memory>
-#include <sstream>
+#include <streambuf>
+#include <string>
+#include <utility>
 
 #include "AssistantHost/CommandReader.h"
 #include "AssistantHost/InputFile.h"
+#include "AssistantHost/InputLines.h"
 #include "AssistantHost/JsonLine.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/CommandText.h"
@@ -28,6 +32,29 @@ Failure inOnePlace(Failure failure, const std::string& name) {
   return failure;
 }
 
+/// A file whose beginning has been read already.
+class ResumedBuffer final : public std::streambuf {
+ public:
+  ResumedBuffer(std::string beginning, std::streambuf& rest)
+      : block_(std::move(beginning)), rest_(rest) {
+    setg(block_.data(), block_.data(), block_.data() + block_.size());
+  }
+
+ protected:
+  int_type underflow() override {
+    block_.resize(kBlockSize);
+    const std::streamsize size = rest_.sgetn(block_.data(), std::ssize(block_));
+    if (size <= 0) return traits_type::eof();
+    setg(block_.data(), block_.data(), block_.data() + size);
+    return traits_type::to_int_type(block_.front());
+  }
+
+ private:
+  static constexpr std::size_t kBlockSize = 65536;
+  std::string block_;
+  std::streambuf& rest_;
+};
+
 /// Performs commands one after the other and keeps the worst of their statuses.
 class Performance {
  public:
@@ -42,11 +69,14 @@ class Performance {
 
   /// Performs the command of each line of `in` that is not blank, before the next line is read.
   void performLines(std::istream& in, const std::string& name) {
-    std::string line;
-    for (std::size_t number = 1; !isCutShort_ && std::getline(in, line); ++number) {
-      if (!isBlank(line)) performLine(line, name + ": line " + std::to_string(number));
+    InputLines lines(in);
+    const auto place = [&] { return name + ": line " + std::to_string(lines.number()); };
+    while (!isCutShort_ && lines.next()) {
+      if (!isBlank(lines.line())) performLine(lines.line(), place());
     }
-    if (in.bad()) {
+    if (lines.isTooLong()) {
+      keep(report({Failure::Kind::badInput, place() + ": " + lines.tooLongText()}));
+    } else if (in.bad()) {
       status_ = report({Failure::Kind::platform, name + ": reading failed; try again"});
     } else if (!status_) {
       status_ =
@@ -102,16 +132,17 @@ ExitStatus performInput(Workspace& workspace) {
 ExitStatus performFile(const std::string& file, Workspace& workspace) {
   auto in = openInput(file);
   if (!in) return report(in.failure());
-  const auto text = readAll(*in, file);
-  if (!text) return report(text.failure());
+  const auto beginning = readUpTo(kBytesToJudge, *in, file);
+  if (!beginning) return report(beginning.failure());
   const auto session = workspace.assistant();
   if (!session) return report(session.failure());
   Performance performance(**session);
-  if (isOneDocument(*text)) {
-    performance.perform(*text, file);
+  if (isOneDocument(*beginning)) {
+    performance.perform(*beginning, file);
   } else {
-    std::istringstream lines(*text);
-    performance.performLines(lines, file);
+    ResumedBuffer buffer(*beginning, *in->rdbuf());
+    std::istream whole(&buffer);
+    performance.performLines(whole, file);
   }
   return performance.status();
 }

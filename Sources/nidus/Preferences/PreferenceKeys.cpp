@@ -36,7 +36,7 @@ JsonValue valueOfWord(const PreferenceKey& key, const std::string& word) {
 /// What `text` is as JSON; null when it is none.
 JsonValue jsonValueOf(const std::string& text) {
   try {
-    return parseJson(text);
+    return parseJson(text, kPreferencesLimits);
   } catch (const JsonError&) {
     return {};
   }

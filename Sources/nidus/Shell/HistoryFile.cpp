@@ -8,6 +8,7 @@
 #include <fstream>
 #include <system_error>
 
+#include "AssistantHost/InputLines.h"
 #include "HomePlatform/System/FileDescriptor.h"
 #include "HomePlatform/System/PrivateFiles.h"
 #include "nidus/FileReplacement.h"
@@ -15,15 +16,25 @@
 #include "nidus/StandardStreams.h"
 
 namespace nidus {
+namespace {
+
+void keepLast(std::vector<std::string>& lines) {
+  if (lines.size() <= HistoryFile::kLines) return;
+  lines.erase(lines.begin(), lines.end() - static_cast<std::ptrdiff_t>(HistoryFile::kLines));
+}
+
+}  // namespace
 
 std::vector<std::string> HistoryFile::lines() const {
   std::vector<std::string> lines;
   std::ifstream in(file_);
-  for (std::string line; std::getline(in, line);) lines.push_back(line);
-  if (lines.size() <= kLines) return lines;
-  const bool isLong = lines.size() > 2 * kLines;
-  lines.erase(lines.begin(), lines.end() - static_cast<std::ptrdiff_t>(kLines));
-  if (isLong) {
+  InputLines input(in);
+  while (input.next()) {
+    if (lines.size() == 2 * kLines) keepLast(lines);
+    lines.push_back(input.line());
+  }
+  keepLast(lines);
+  if (input.number() > 2 * kLines) {
     std::string text;
     for (const std::string& line : lines) text += line + '\n';
     // A history that could not be cut is as good as before.

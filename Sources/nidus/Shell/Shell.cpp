@@ -10,6 +10,7 @@
 #include <sstream>
 #include <utility>
 
+#include "AssistantHost/InputLines.h"
 #include "AssistantHost/SyncClient.h"
 #include "nidus/CommandLine.h"
 #include "nidus/Completion/Completion.h"
@@ -89,12 +90,14 @@ Shell::Shell(Workspace& workspace, std::function<void(CommandSyntax&)> declare)
 
 ExitStatus Shell::runLines(std::istream& in) {
   ExitStatus highest = ExitStatus::success;
-  std::string line;
-  for (std::size_t number = 1; !isOver_ && std::getline(in, line); ++number) {
-    const ReportPlace place("line " + std::to_string(number) + ": ");
-    highest = std::max(highest, runLine(line));
+  InputLines lines(in);
+  while (!isOver_ && lines.next()) {
+    const ReportPlace place("line " + std::to_string(lines.number()) + ": ");
+    highest = std::max(highest, runLine(lines.line()));
   }
-  return highest;
+  if (!lines.isTooLong()) return highest;
+  const ReportPlace place("line " + std::to_string(lines.number()) + ": ");
+  return std::max(highest, report({Failure::Kind::badInput, lines.tooLongText()}));
 }
 
 ExitStatus Shell::talk() {

@@ -31,5 +31,16 @@ TEST(JsonPathTest, FollowsObjectsAndArrays) {
   EXPECT_EQ(path.place(), "/base/list");
 }
 
+TEST(JsonPathTest, StandsAtObjectBetweenItsKeys) {
+  JsonPath path;
+  path.enterObject();
+  EXPECT_EQ(path.place(), "");
+  path.setKey("");
+  EXPECT_EQ(path.place(), "/");
+  path.endValue();
+  EXPECT_EQ(path.place(), "");
+  EXPECT_EQ(path.index(), 1U);
+}
+
 }  // namespace
 }  // namespace nidus

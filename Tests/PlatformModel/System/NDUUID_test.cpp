@@ -163,5 +163,18 @@ TEST(NDUUIDTest, HashTellsNeighboursApart) {
   EXPECT_EQ(std::hash<NDUUID>{}(NDUUID()), std::hash<NDUUID>{}(NDUUID()));
 }
 
+TEST(NDUUIDTest, HashTellsColludingUUIDsApart) {
+  // Alike to hashes that add up bytes, halves or words.
+  std::unordered_set<std::size_t> hashes;
+  for (std::uint8_t i = 0; i < 100; ++i) {
+    const auto j = static_cast<std::uint8_t>(100 - i);
+    hashes.insert(std::hash<NDUUID>{}(NDUUID({i, 0, 0, 0, 0, 0, 0, 0, i})));
+    hashes.insert(std::hash<NDUUID>{}(NDUUID({1, 0, i, 0, 0, 0, j, 0})));
+  }
+  hashes.insert(std::hash<NDUUID>{}(NDUUID({2, 0})));
+  hashes.insert(std::hash<NDUUID>{}(NDUUID({1, 131})));
+  EXPECT_EQ(hashes.size(), 202U);
+}
+
 }  // namespace
 }  // namespace nidus
