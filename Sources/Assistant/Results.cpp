@@ -73,7 +73,6 @@ bool fillLimit(VAHAActionResult& result, const VAHAAction& action,
   if (!metadata) return false;
   const NDValueRef& value = ((*metadata).*limit)();
   result.setResultValue(setValue(value, format, metadata->units()));
-  result.setOutcome(VAHAActionOutcomeSUCCESSValue);
   if (!action.value() || setsToLimit(action.actionType())) return value != nullptr;
   return isAttributeValueEqual(action.value(), result.resultValue());
 }

@@ -129,5 +129,4 @@ void WLOLogV(int level, const char* format, std::span<const nidus::WLOArgument> 
   if (format) message->set("Message", nidus::formatted(format, arguments));
   if (nidus::isConnected()) nidus::connection->client->send(*message);
 } catch (...) {
-  return;
 }
