@@ -298,6 +298,11 @@ TEST_F(FilterTest, FindsNothingInRoomsWithoutName) {
   EXPECT_THAT(find({.zone = "Ground"}), IsEmpty());
 }
 
+TEST_F(FilterTest, ObjectWithoutRoomIsInNoRoom) {
+  snapshot({roomRecord(""), serviceInRoom("Lamp", ""), serviceRecord("Fan")});
+  EXPECT_THAT(find({.room = ""}), ElementsAre("Lamp"));
+}
+
 TEST_F(FilterTest, LooksRoomsUpInTheSnapshotNotTheList) {
   snapshot({roomRecord("Hall"), serviceInRoom("Lamp", "Hall"), serviceInRoom("Fan", "Hall")});
   const NDAssistantCommand::ObjectList list = {&command_->nidusObjects()[2],

@@ -7,6 +7,7 @@
 
 #include "Assistant/CommandTest.h"
 #include "PlatformModel/NDPlatform.h"
+#include "Support/InlineQueue.h"
 #include "Support/TestTypes.h"
 
 namespace nidus {
@@ -197,6 +198,13 @@ TEST_F(GetTest, ReportsOnTheMainQueue) {
   EXPECT_THAT(replies(), IsEmpty());
   EXPECT_TRUE(runOneOfMainQueue());
   EXPECT_THAT(replies(), SizeIs(1));
+}
+
+TEST_F(GetTest, HomeMayAnswerAtOnce) {
+  const auto home = useHome(HomeBuilder("Cottage").light("Lamp"));
+  home->answerOn(std::make_shared<InlineQueue>());
+  get("POWER");
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS POWER=false"));
 }
 
 TEST_F(GetTest, RepliesNothingWithoutAnswer) {

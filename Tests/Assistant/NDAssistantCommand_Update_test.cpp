@@ -4,8 +4,10 @@
 #include <memory>
 #include <string>
 #include <utility>
+#include <vector>
 
 #include "Assistant/CommandTest.h"
+#include "Support/InlineQueue.h"
 #include "Support/TestTypes.h"
 
 namespace nidus {
@@ -203,6 +205,14 @@ TEST_F(UpdateTest, RefusesActionsThatDoNotSuitTheType) {
   EXPECT_THAT(home->reads(), IsEmpty());
 }
 
+TEST_F(UpdateTest, LogsWhatDoesNotSuitBeforeItReplies) {
+  useHome(HomeBuilder("Cottage").light("Lamp"));
+  std::vector<std::string> logged;
+  onReply([&] { logged = log(3); });
+  update("INCREASE", "POWER");
+  EXPECT_THAT(logged, SizeIs(1));
+}
+
 TEST_F(UpdateTest, AcceptsOtherActionTypes) {
   const auto home = useHome(HomeBuilder("Cottage").light("Lamp", {brightness(40)}));
   const auto command = performed(makeCommand(nullptr, {}));
@@ -354,6 +364,24 @@ TEST_F(UpdateTest, LetsGoOfEverythingAfterTheUnlock) {
   perform(std::move(command));
   EXPECT_TRUE(isHandlerReleased());
   EXPECT_TRUE(watched.expired());
+}
+
+TEST_F(UpdateTest, HomeMayAnswerAtOnce) {
+  const auto home = useHome(HomeBuilder("Cottage").light("Lamp", {brightness(40)}));
+  home->answerOn(std::make_shared<InlineQueue>());
+  update("INCREASE", "BRIGHTNESS");
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS BRIGHTNESS=45 PERCENTAGE"));
+}
+
+TEST_F(UpdateTest, WritesNothingToServicesThatAreGone) {
+  const auto home = useHome(HomeBuilder("Cottage").light("Lamp", {brightness(40)}));
+  home->holdAnswers();
+  update("INCREASE", "BRIGHTNESS");
+  home->removeAccessories();
+  home->releaseAnswers();
+  runUntilIdle();
+  EXPECT_THAT(home->writes(), IsEmpty());
+  EXPECT_THAT(replies(), ElementsAre("FOUND_NO_MATCHING_ENTITIES"));
 }
 
 TEST_F(UpdateTest, RepliesNothingWithoutAnswer) {

@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "Assistant/CommandTest.h"
+#include "Support/InlineQueue.h"
 #include "Support/TestTypes.h"
 
 namespace nidus {
@@ -247,6 +248,13 @@ TEST_F(SetTest, LeavesTheGroupBeforeItReportsTheUnlock) {
   onReply([&] { isReportWaiting = isReportWaiting || runOneOfMainQueue(); });
   set("POWER", booleanValue(true));
   EXPECT_TRUE(isReportWaiting);
+}
+
+TEST_F(SetTest, HomeMayAnswerAtOnce) {
+  const auto home = useHome(HomeBuilder("Cottage").light("Lamp"));
+  home->answerOn(std::make_shared<InlineQueue>());
+  set("POWER", booleanValue(true));
+  EXPECT_THAT(replies(), ElementsAre("COMMAND_SUCCESS; Lamp SUCCESS POWER=true"));
 }
 
 TEST_F(SetTest, ReportsInTheOrderOfTheAnswers) {

@@ -3,11 +3,13 @@
 #include <gmock/gmock.h>
 
 #include <chrono>
+#include <functional>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "PlatformModel/System/NDSerialQueue.h"
+#include "Support/InlineQueue.h"
 #include "Support/PlatformTest.h"
 #include "Support/TestTypes.h"
 
@@ -25,8 +27,12 @@ std::string textOf(const NDString& text) { return text ? text.str() : "none"; }
 
 class BeginInfo final : public AFSyncBeginInfo {
  public:
-  void resetWithValidity(const NDString& validity) override { resets.push_back(textOf(validity)); }
+  void resetWithValidity(const NDString& validity) override {
+    resets.push_back(textOf(validity));
+    if (onReset) onReset();
+  }
   Texts resets;
+  std::function<void()> onReset;
 };
 
 class ChangeInfo final : public AFSyncChangeInfo {
@@ -37,12 +43,6 @@ class ChangeInfo final : public AFSyncChangeInfo {
   std::string postAnchor;
 };
 
-/// Runs each task at once, on the thread that brings it.
-class InlineQueue final : public NDQueue {
- public:
-  void async(NDTask task) override { task(); }
-};
-
 class NDAssistantSyncHomeTest : public PlatformTest {
  protected:
   NDAssistantSyncHomeTest() : sync_(NDAssistantSyncHome::init()) {}
@@ -50,6 +50,7 @@ class NDAssistantSyncHomeTest : public PlatformTest {
   /// Begins a sync with `key`; gives the info that was handed in.
   std::shared_ptr<BeginInfo> begin(const NDString& key = kKey) {
     auto info = std::make_shared<BeginInfo>();
+    info->onReset = onReset_;
     sync_->beginSyncWithAnchor_validity_forKey_beginInfo("17", "old", key, info);
     return info;
   }
@@ -77,6 +78,7 @@ class NDAssistantSyncHomeTest : public PlatformTest {
   }
 
   std::shared_ptr<NDAssistantSyncHome> sync_;
+  std::function<void()> onReset_;
 };
 
 TEST_F(NDAssistantSyncHomeTest, StartsEmpty) {
@@ -257,6 +259,30 @@ TEST_F(NDAssistantSyncHomeTest, HoldsTheReportUntilItWaits) {
   EXPECT_THAT(log(), IsEmpty());
 }
 
+TEST_F(NDAssistantSyncHomeTest, QueueMayBuildAtOnce) {
+  useHome(fourObjects());
+  platform().setReporting(TestPlatform::Reporting::early);
+  sync_->setQueue(std::make_shared<InlineQueue>());
+  EXPECT_THAT(begin()->resets, ElementsAre("3405691582"));
+  EXPECT_EQ(allChanges().size(), 5U);
+}
+
+TEST_F(NDAssistantSyncHomeTest, ResetFindsTheListsPublished) {
+  useHome(fourObjects());
+  Texts changes;
+  onReset_ = [&] { changes = allChanges(); };
+  begin();
+  EXPECT_EQ(changes.size(), 5U);
+}
+
+TEST_F(NDAssistantSyncHomeTest, ReasonIsLoggedBeforeTheReset) {
+  platform().configureHomes(false);
+  Texts logged;
+  onReset_ = [&] { logged = log(); };
+  begin();
+  EXPECT_THAT(logged, ElementsAre("6 No homes configured - short-circuiting sync"));
+}
+
 TEST_F(NDAssistantSyncHomeTest, SilentPlatformEndsTheWait) {
   useHome(fourObjects());
   platform().setSilent(true);
@@ -284,6 +310,15 @@ TEST_F(NDAssistantSyncHomeTest, IsDoneBeforeTheGroupIsLeft) {
   sync_->group()->notify(std::make_shared<InlineQueue>(), [&] { wasDone = sync_->done(); });
   platform().runUntilIdle();
   EXPECT_TRUE(wasDone);
+}
+
+TEST_F(NDAssistantSyncHomeTest, WatchdogLogsBeforeTheGroupIsLeft) {
+  platform().setSilent(true);
+  begin();
+  Texts logged;
+  sync_->group()->notify(std::make_shared<InlineQueue>(), [&] { logged = log(); });
+  platform().runUntilIdle();
+  EXPECT_THAT(logged, ElementsAre("6 Timed out waiting for nidusd", "6 nidusd did not respond"));
 }
 
 TEST_F(NDAssistantSyncHomeTest, LowerLogLevelHidesTheMessages) {
@@ -343,6 +378,19 @@ TEST_F(NDAssistantSyncHomeTest, LateBuildLeavesTheNextSyncAlone) {
   EXPECT_THAT(allChanges(), ElementsAre("Cabin 3405691582", "end 3405691582"));
 }
 
+TEST_F(NDAssistantSyncHomeTest, LateBuildLeavesAnUnconfiguredSyncEmpty) {
+  useHome(fourObjects());
+  platform().setSilent(true);
+  const auto first = begin();
+  platform().lastManager()->report();  // queues the build task
+  platform().configureHomes(false);
+  begin();
+  platform().runUntilIdle();
+  EXPECT_THAT(first->resets, ElementsAre("3405691582"));
+  EXPECT_FALSE(sync_->finalAnchor());
+  EXPECT_EQ(change(nullptr), "end none");
+}
+
 TEST_F(NDAssistantSyncHomeTest, DestroyedHandlerIgnoresTheSnapshot) {
   useHome(fourObjects());
   platform().setSilent(true);
@@ -374,7 +422,7 @@ TEST_F(NDAssistantSyncHomeDeathTest, WrongKeyStopsTheProcess) {
   EXPECT_DEATH(begin("com.corvane.nidus.other"),
                "Assertion failure in -\\[NDAssistantSyncHome "
                "beginSyncWithAnchor:validity:forKey:beginInfo:\\], "
-               "Sources/Assistant/NDAssistantSyncHome:80: key == \"com.corvane.nidus.name\"");
+               "Sources/Assistant/NDAssistantSyncHome:80: key == \"com.corvane.nidus.name\"\n$");
 }
 
 TEST_F(NDAssistantSyncHomeDeathTest, MissingKeyStopsTheProcess) {
@@ -391,10 +439,11 @@ TEST_F(NDAssistantSyncHomeDeathTest, WrongKeyStopsTheSecondSync) {
 TEST_F(NDAssistantSyncHomeDeathTest, UnequalListsStopTheProcess) {
   GTEST_FLAG_SET(death_test_style, "threadsafe");
   sync_->setPostAnchors(NDAssistantSyncHome::Anchors{"1"});
-  EXPECT_DEATH(change(nullptr),
-               "Assertion failure in -\\[NDAssistantSyncHome "
-               "getChangeAfterAnchor:changeInfo:\\], "
-               "Sources/Assistant/NDAssistantSyncHome:173: _postAnchors.count == _entities.count");
+  EXPECT_DEATH(
+      change(nullptr),
+      "Assertion failure in -\\[NDAssistantSyncHome "
+      "getChangeAfterAnchor:changeInfo:\\], "
+      "Sources/Assistant/NDAssistantSyncHome:173: _postAnchors.count == _entities.count\n$");
 }
 
 }  // namespace

@@ -233,6 +233,16 @@ TEST_F(WLOLogTest, EachLevelHasItsName) {
   });
 }
 
+#ifndef NDEBUG
+using WLOLogDeathTest = WLOLogTest;
+
+TEST_F(WLOLogDeathTest, LevelsWithoutNameStopTheProcess) {
+  GTEST_FLAG_SET(death_test_style, "threadsafe");
+  EXPECT_DEATH(WLOLog(-1, "x", {}), "level >= 0 && level <= 7");
+  EXPECT_DEATH(WLOLog(8, "x", {}), "level >= 0 && level <= 7");
+}
+#endif
+
 TEST_F(WLOLogTest, MissingFormatLeavesTheTextOut) {
   inFreshProcess([] {
     WLOLog(3, nullptr, {});

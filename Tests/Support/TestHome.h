@@ -60,6 +60,9 @@ class TestHome : public NDHome {
   [[nodiscard]] std::vector<Writes> writes() const;
   [[nodiscard]] std::vector<std::shared_ptr<NDActionSet>> executions() const;
 
+  /// Removes all accessories from the home; nothing else may be looking at them.
+  void removeAccessories() { accessories_ = {}; }
+
   /// Answers every batch of that kind, or every run, with the error `code` as a whole.
   void failReads(std::int64_t code);
   void failWrites(std::int64_t code);
