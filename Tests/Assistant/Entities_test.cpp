@@ -76,6 +76,7 @@ TEST_F(EntitiesTest, EachEntityHasAnIdentifierOfItsOwn) {
   EXPECT_NE(first, entityFromObject(record)->identifier()->text());
   EXPECT_THAT(first.str(), MatchesRegex("x-corvane-nidus://local/[0-9A-F]{8}-[0-9A-F]{4}-"
                                         "[0-9A-F]{4}-[0-9A-F]{4}-[0-9A-F]{12}"));
+  EXPECT_EQ(first.view().size(), 60U);  // with nothing behind a zero, which ends what is matched
 }
 
 TEST_F(EntitiesTest, ServiceTypeThatWasAskedForWins) {

@@ -430,6 +430,13 @@ class ObservedFilterTest : public FilterTest {
   const std::shared_ptr<RecordingObserver> observer_ = std::make_shared<RecordingObserver>();
 };
 
+TEST_F(ObservedFilterTest, HearsOfTheHomeAmongEqualNames) {
+  snapshot({homeRecord("Home"), serviceOfHome("Lamp", "Home", "9E01-AB"), homeRecord("Home")});
+  primaryHome("Home", "9E01-AB");
+  static_cast<void>(find({}, "Home"));
+  EXPECT_THAT(observer_->steps, ElementsAre(Pair("snapshot", 3), Pair("home", 1)));
+}
+
 TEST_F(ObservedFilterTest, HearsOfEachStepThatRan) {
   auto lamp = serviceInRoom("Lamp", "Hall");
   lamp.objectGroups = {"Evening"};

@@ -355,6 +355,18 @@ TEST_F(NDAssistantSyncHomeTest, SnapshotAfterTheTimeOutSilencesTheWatchdog) {
   EXPECT_THAT(log(), ElementsAre("6 Timed out waiting for nidusd"));
 }
 
+TEST_F(NDAssistantSyncHomeTest, ResetsBeforeTheGroupIsLeft) {
+  useHome(fourObjects());
+  platform().setSilent(true);
+  sync_->setQueue(platform().mainQueue());  // which a wait does not run
+  platform().sharedQueue()->async([] { platform().lastManager()->report(); });
+  const auto info = begin();
+  Texts resets;
+  sync_->group()->notify(std::make_shared<InlineQueue>(), [&] { resets = info->resets; });
+  platform().runUntilIdle();
+  EXPECT_THAT(resets, ElementsAre("3405691582"));
+}
+
 TEST_F(NDAssistantSyncHomeTest, SecondBeginTakesANewSnapshot) {
   useHome(fourObjects());
   begin();
@@ -389,6 +401,20 @@ TEST_F(NDAssistantSyncHomeTest, LateBuildLeavesAnUnconfiguredSyncEmpty) {
   EXPECT_THAT(first->resets, ElementsAre("3405691582"));
   EXPECT_FALSE(sync_->finalAnchor());
   EXPECT_EQ(change(nullptr), "end none");
+}
+
+TEST_F(NDAssistantSyncHomeTest, SnapshotOfAFormerSyncIsIgnored) {
+  useHome(fourObjects());
+  platform().setSilent(true);
+  const auto first = begin();
+  platform().runUntilIdle();
+  const auto gather = sync_->gather();
+  const auto manager = platform().lastManager();
+  begin();
+  platform().runUntilIdle();
+  manager->report();
+  platform().runUntilIdle();
+  EXPECT_THAT(first->resets, IsEmpty());
 }
 
 TEST_F(NDAssistantSyncHomeTest, DestroyedHandlerIgnoresTheSnapshot) {

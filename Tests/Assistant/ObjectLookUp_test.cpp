@@ -53,6 +53,7 @@ TEST(SplitIdentifierTest, GivesThePartsThatAreThere) {
       {"other separators", "x-corvane-nidus://local/x?id:1?home:H", "x 1 H -"},
       {"empty value", "x-corvane-nidus://local/x?id=&home=H", "x  H -"},
       {"key within words", "x-corvane-nidus://local/x?idid=1&xid=2&idx=3&id=4", "x 4 - -"},
+      {"key within the first word", "x-corvane-nidus://local/x?xid=2&id=3", "x 3 - -"},
       {"key before a hash", "x-corvane-nidus://local/x?id=1#home=2", "x 1 - -"},
       {"key as a value", "x-corvane-nidus://local/x?id=home&home=H", "x home home -"},
       {"unknown keys", "x-corvane-nidus://local/x?a=b", "x - - -"},

@@ -218,6 +218,8 @@ TEST_F(ResultsTest, ComparesLimitQueriesWithTheirValue) {
       fill(light(), {.type = "GET_MAXIMUM", .attribute = "BRIGHTNESS", .value = integerValue(99)}));
   EXPECT_TRUE(fill(
       light(), {.type = "SET_TO_MAXIMUM", .attribute = "BRIGHTNESS", .value = integerValue(99)}));
+  EXPECT_TRUE(fill(
+      light(), {.type = "SET_TO_MINIMUM", .attribute = "BRIGHTNESS", .value = integerValue(99)}));
 }
 
 // The value replaces what the missing limit has said.
