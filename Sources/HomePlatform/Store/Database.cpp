@@ -51,12 +51,21 @@ Database::~Database() { sqlite3_close_v2(connection_); }
 
 void Database::configure(std::chrono::milliseconds lockTimeout) {
   sqlite3_extended_result_codes(connection_, 1);
+  limitSizes();
   check(sqlite3_busy_timeout(connection_, static_cast<int>(lockTimeout.count())));
   check(sqlite3_db_config(connection_, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr));
   if (sqlite3_db_readonly(connection_, "main") != 0) {
     throw DatabaseError{DatabaseError::Kind::notWritable, "the file is read-only"};
   }
   run("PRAGMA foreign_keys = ON; PRAGMA trusted_schema = OFF; PRAGMA synchronous = FULL");
+}
+
+/// Far above all that this program writes: what is larger is no work of its own.
+void Database::limitSizes() {
+  constexpr int kBytesOfRow = 16'000'000;
+  constexpr int kBytesOfStatement = 10'000;
+  sqlite3_limit(connection_, SQLITE_LIMIT_LENGTH, kBytesOfRow);
+  sqlite3_limit(connection_, SQLITE_LIMIT_SQL_LENGTH, kBytesOfStatement);
 }
 
 void Database::useWriteAheadLog() {
@@ -162,7 +171,8 @@ bool Statement::step() {
   if (code == SQLITE_ROW) return true;
   if (code == SQLITE_DONE) return false;
   sqlite3_reset(statement_);
-  database_.fail(code);
+  // A text that is bound is never too long, so it is one of the tables.
+  database_.fail(code == SQLITE_TOOBIG ? SQLITE_CORRUPT : code);
 }
 
 void Statement::reset() {

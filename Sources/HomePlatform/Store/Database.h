@@ -66,6 +66,7 @@ class Database {
  private:
   friend class Statement;
   void configure(std::chrono::milliseconds lockTimeout);
+  void limitSizes();
   void check(int code) const;
   [[noreturn]] void fail(int code) const;
 

@@ -41,8 +41,13 @@ Status prepareDatabaseFile(const fs::path& file) {
     return failure(file, "the database cannot be made", error,
                    "give yourself write permission on its folder");
   }
-  if (std::error_code ignored; fs::is_directory(file, ignored)) {
+  std::error_code ignored;
+  if (fs::is_directory(file, ignored)) {
     return failure(file, "a folder is where the database has to be", EISDIR, "move it away");
+  }
+  if (fs::is_other(file, ignored)) {
+    return failure(file, "a device or pipe is where the database has to be", EINVAL,
+                   "move it away");
   }
   if (mayWrite(file, 0)) return std::nullopt;
   return failure(file, "the database cannot be written", errno,

@@ -148,6 +148,24 @@ bool isEmpty(Database& database) {
   return database.number("SELECT count(*) FROM sqlite_schema") == 0;
 }
 
+/// All statements that a database's tables are made of, in an order that depends on nothing else.
+std::string statementsOf(Database& database) {
+  Statement all(database,
+                "SELECT group_concat(sql, ';') FROM "
+                "(SELECT sql FROM sqlite_schema WHERE sql IS NOT NULL ORDER BY sql)");
+  all.step();
+  return std::string(all.text(0));
+}
+
+/// Refuses tables that are not exactly those of `version`: views and triggers in a database that
+/// somebody else has made could let a statement do anything, or never end.
+void checkTables(Database& database, const std::vector<std::string>& steps, std::size_t version) {
+  Database sound(Database::kInMemory, std::chrono::milliseconds(0));
+  for (std::size_t step = 0; step < version; ++step) sound.run(steps[step]);
+  if (statementsOf(database) == statementsOf(sound)) return;
+  throw DatabaseError{DatabaseError::Kind::damaged, "its tables are not those of this program"};
+}
+
 }  // namespace
 
 const std::vector<std::string>& schemaSteps() {
@@ -167,6 +185,7 @@ std::optional<SchemaProblem> schemaProblemOf(Database& database,
   }
   const std::int64_t version = database.number("PRAGMA user_version");
   if (version < 0 || version > static_cast<std::int64_t>(steps.size())) return SchemaProblem::newer;
+  checkTables(database, steps, static_cast<std::size_t>(version));
   return std::nullopt;
 }
 
@@ -181,7 +200,10 @@ void runSchemaSteps(Database& database, const std::vector<std::string>& steps) {
 
 std::optional<SchemaProblem> applySchema(Database& database, const std::vector<std::string>& steps,
                                          const MigrationHooks& hooks) {
-  if (isSchemaCurrent(database, steps)) return std::nullopt;  // nearly always, and without a lock
+  if (isSchemaCurrent(database, steps)) {  // nearly always, and without a lock
+    checkTables(database, steps, steps.size());
+    return std::nullopt;
+  }
   Transaction transaction(database, Transaction::Kind::writing);
   // Another process may have been the first.
   if (isSchemaCurrent(database, steps)) return std::nullopt;

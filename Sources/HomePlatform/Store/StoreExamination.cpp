@@ -46,6 +46,8 @@ class Look {
   }
 
   void checkVersion() {
+    // Another process may be making the tables.
+    const Transaction oneState(*database_, Transaction::Kind::reading);
     if (const auto problem = schemaProblemOf(*database_, schemaSteps())) {
       found_.failures.push_back(failureOf(*problem, file_));
     }

@@ -10,18 +10,18 @@
 namespace nidus {
 namespace {
 
-std::string written(const Vocabulary& vocabulary) {
+std::string textOf(const Vocabulary& vocabulary) {
   std::ostringstream out;
   writeVocabulary(out, vocabulary);
   return out.str();
 }
 
 TEST(VocabularyWriterTest, WritesWhatReadsBackTheSame) {
-  const std::string text = written(builtInVocabulary());
+  const std::string text = textOf(builtInVocabulary());
   const auto again = mergeVocabulary({}, text, "again.json");
   ASSERT_TRUE(again);
   EXPECT_EQ(again->characteristics.size(), builtInVocabulary().characteristics.size());
-  EXPECT_EQ(written(*again), text);
+  EXPECT_EQ(textOf(*again), text);
 }
 
 TEST(VocabularyWriterTest, WritesAllOfAnEntry) {
@@ -32,11 +32,11 @@ TEST(VocabularyWriterTest, WritesAllOfAnEntry) {
       "{\"format\": \"nidus-vocabulary/1\",\n  \"characteristics\": [\n    " + entry + "\n  ]}\n";
   const auto vocabulary = mergeVocabulary({}, document, "mine.json");
   ASSERT_TRUE(vocabulary);
-  EXPECT_EQ(written(*vocabulary), document);
+  EXPECT_EQ(textOf(*vocabulary), document);
 }
 
 TEST(VocabularyWriterTest, WritesNoListOfNothing) {
-  EXPECT_EQ(written({}), "{\"format\": \"nidus-vocabulary/1\"}\n");
+  EXPECT_EQ(textOf({}), "{\"format\": \"nidus-vocabulary/1\"}\n");
 }
 
 }  // namespace
