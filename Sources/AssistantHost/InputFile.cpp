@@ -5,6 +5,8 @@
 #include <cerrno>
 #include <system_error>
 
+#include "HomePlatform/System/DocumentFile.h"
+
 namespace nidus {
 namespace {
 
@@ -16,8 +18,9 @@ Failure inputFailure(const std::string& name, const std::string& reason) {
 }  // namespace
 
 Result<std::ifstream> openInput(const std::filesystem::path& file) {
-  std::error_code error;
-  if (std::filesystem::is_directory(file, error)) return inputFailure(file.string(), "a folder");
+  if (const std::string kind = noDocumentBut(file); !kind.empty()) {
+    return inputFailure(file.string(), kind);
+  }
   std::ifstream in(file, std::ios::binary);
   if (!in) return inputFailure(file.string(), std::generic_category().message(errno));
   return in;

@@ -10,7 +10,8 @@
 
 namespace nidus {
 
-/// Opens a file for reading. A file that is missing, unreadable or a folder is bad input.
+/// Opens a file for reading. A file that is missing, unreadable, a folder or a named pipe is
+/// bad input.
 [[nodiscard]] Result<std::ifstream> openInput(const std::filesystem::path& file);
 
 /// Reads what is left of `in`, but no more than `mostBytes`. `name` stands for it in the failure.

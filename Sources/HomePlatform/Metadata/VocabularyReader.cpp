@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "HomePlatform/Json/JsonObject.h"
+#include "HomePlatform/System/DocumentFile.h"
 
 namespace nidus {
 
@@ -188,6 +189,10 @@ Result<Vocabulary> mergeVocabulary(Vocabulary base, std::string_view text,
 
 Result<Vocabulary> loadVocabulary(const std::optional<std::filesystem::path>& path) {
   if (!path) return builtInVocabulary();
+  if (const std::string kind = noDocumentBut(*path); !kind.empty()) {
+    return Failure{Failure::Kind::platform, path->string() + ": " + kind +
+                                                " is where the vocabulary has to be; move it away"};
+  }
   errno = 0;
   std::ifstream file(*path, std::ios::binary);
   if (!file && errno == ENOENT) return builtInVocabulary();

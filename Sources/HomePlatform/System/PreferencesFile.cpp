@@ -10,6 +10,7 @@
 #include <system_error>
 
 #include "HomePlatform/Json/JsonText.h"
+#include "HomePlatform/System/DocumentFile.h"
 #include "HomePlatform/System/FileDescriptor.h"
 #include "HomePlatform/System/FilePlacing.h"
 
@@ -73,9 +74,10 @@ int replaceFile(const std::filesystem::path& path, std::string_view text) {
 }  // namespace
 
 Result<PreferencesContent> PreferencesFile::read() const {
-  if (std::error_code ignored; std::filesystem::is_directory(path_, ignored)) {
-    return Failure{Failure::Kind::platform,
-                   path_.string() + ": a folder is where the preferences have to be; move it away"};
+  if (const std::string kind = noDocumentBut(path_); !kind.empty()) {
+    return Failure{
+        Failure::Kind::platform,
+        path_.string() + ": " + kind + " is where the preferences have to be; move it away"};
   }
   errno = 0;
   std::ifstream file(path_, std::ios::binary);

@@ -1,5 +1,4 @@
 #include <algorithm>
-#include <fstream>
 #include <memory>
 #include <optional>
 #include <sstream>
@@ -31,8 +30,9 @@ std::string documentOf(const std::vector<HomeData>& homes) {
 
 /// As much of the file as a document may have, and a byte more if it has more.
 std::string contentOf(const std::filesystem::path& file) {
-  std::ifstream in(file, std::ios::binary);
-  auto content = readUpTo(kHomeDocumentLimits.documentBytes + 1, in, file.string());
+  auto in = openInput(file);
+  if (!in) return {};
+  auto content = readUpTo(kHomeDocumentLimits.documentBytes + 1, *in, file.string());
   return content ? std::move(*content) : std::string();
 }
 

@@ -9,6 +9,7 @@
 #include <system_error>
 
 #include "AssistantHost/InputLines.h"
+#include "HomePlatform/System/DocumentFile.h"
 #include "HomePlatform/System/FileDescriptor.h"
 #include "HomePlatform/System/PrivateFiles.h"
 #include "nidus/FileReplacement.h"
@@ -27,6 +28,7 @@ void keepLast(std::vector<std::string>& lines) {
 
 std::vector<std::string> HistoryFile::lines() const {
   std::vector<std::string> lines;
+  if (!noDocumentBut(file_).empty()) return lines;
   std::ifstream in(file_);
   InputLines input(in);
   while (input.next()) {
@@ -46,8 +48,8 @@ std::vector<std::string> HistoryFile::lines() const {
 Status HistoryFile::add(const std::string& line) const {
   // What cannot be made here shows when the file is opened.
   static_cast<void>(makePrivateFolder(file_.parent_path()));
-  const FileDescriptor file(
-      ::open(file_.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, S_IRUSR | S_IWUSR));
+  constexpr int kFlags = O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC | O_NONBLOCK;  // for pipes
+  const FileDescriptor file(::open(file_.c_str(), kFlags, S_IRUSR | S_IWUSR));
   if (file && writeWhole(file.get(), line + '\n')) return std::nullopt;
   return Failure{Failure::Kind::platform, file_.string() + ": the history cannot be written (" +
                                               std::generic_category().message(errno) +
