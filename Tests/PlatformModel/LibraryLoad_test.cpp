@@ -6,17 +6,7 @@
 #include <system_error>
 
 #include "PlatformModel/NDPlatform.h"
-
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-#define ND_IS_SANITIZED true
-#elif defined(__has_feature)
-#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer)
-#define ND_IS_SANITIZED true
-#endif
-#endif
-#ifndef ND_IS_SANITIZED
-#define ND_IS_SANITIZED false
-#endif
+#include "Support/Sanitizers.h"
 
 namespace nidus {
 namespace {
@@ -44,7 +34,7 @@ TEST(LibraryLoadTest, SeesWhatOthersRun) {
 }
 
 TEST(LibraryLoadTest, RunsNothingOfOurs) {
-  if (ND_IS_SANITIZED) GTEST_SKIP() << "the sanitizers add functions of their own";
+  if (kIsSanitized) GTEST_SKIP() << "the sanitizers add functions of their own";
   const link_map* library = libraryOf(reinterpret_cast<const void*>(&NDPlatform::registered));
   ASSERT_NE(library, nullptr);
   ASSERT_NE(std::string(library->l_name).find("libPlatformModel"), std::string::npos);

@@ -2,6 +2,7 @@
 #include <iterator>
 #include <sstream>
 
+#include "HomePlatform/Json/JsonLimits.h"
 #include "nidus/CommandLine.h"
 #include "nidus/Completion/CommandOutline.h"
 #include "nidus/ProgramTest.h"
@@ -92,6 +93,45 @@ TEST_F(ManualTest, HasNoCommandThatThereIsNot) {
     if (word != "home") continue;
     words >> word;
     EXPECT_TRUE(command->findCommand(word)) << word;
+  }
+}
+
+/// A number as the page writes it: 4,000,000.
+std::string grouped(std::size_t number) {
+  std::string text = std::to_string(number);
+  for (std::size_t digits = 3; digits < text.size(); digits += 4) {
+    text.insert(text.size() - digits, ",");
+  }
+  return text;
+}
+
+TEST_F(ManualTest, TellsTheLimitsThatAreKept) {
+  const std::size_t start = page_.find("\n.SH LIMITS");
+  const std::string part = page_.substr(start, page_.find("\n.SH", start + 1) - start);
+  const JsonLimits usual;
+  EXPECT_THAT(part, HasSubstr("scenario has at most " + grouped(usual.documentBytes) + " bytes"));
+  EXPECT_EQ(kHomeDocumentLimits.documentBytes, usual.documentBytes);
+  EXPECT_EQ(kScenarioLimits.documentBytes, usual.documentBytes);
+  EXPECT_THAT(part, HasSubstr("vocabulary " + grouped(kVocabularyLimits.documentBytes) + ','));
+  EXPECT_THAT(part, HasSubstr("command\n" + grouped(kCommandLimits.documentBytes) + ','));
+  EXPECT_THAT(part, HasSubstr("preferences " + grouped(kPreferencesLimits.documentBytes) + '.'));
+  EXPECT_THAT(part, HasSubstr("A text has at most " + grouped(usual.textBytes) + " bytes"));
+  EXPECT_THAT(part, HasSubstr("a key " + grouped(usual.keyBytes) + ','));
+  EXPECT_THAT(part, HasSubstr("a number " + grouped(usual.numberBytes) + ','));
+  EXPECT_THAT(part, HasSubstr("of them " + grouped(usual.spaceBytes) + '.'));
+  EXPECT_THAT(part, HasSubstr("array has at most " + grouped(usual.arrayElements) + " elements"));
+  EXPECT_THAT(part, HasSubstr("alone " + grouped(kCommandLimits.arrayElements) + '.'));
+  EXPECT_THAT(part, HasSubstr("most " + grouped(usual.objectKeys) + " keys"));
+  EXPECT_THAT(part, HasSubstr("at most " + grouped(usual.depth) + " deep"));
+}
+
+TEST_F(ManualTest, TellsHowManyValuesThereMayBe) {
+  for (const auto& [before, limits] :
+       {std::pair("command has at most ", kCommandLimits),
+        std::pair("a vocabulary ", kVocabularyLimits),
+        std::pair("the preferences ", kPreferencesLimits), std::pair("scenario ", kScenarioLimits),
+        std::pair("document has at most ", kHomeDocumentLimits)}) {
+    EXPECT_THAT(page_, HasSubstr(before + grouped(limits.valuesInMemory)));
   }
 }
 

@@ -2,6 +2,7 @@
 
 #include <sys/types.h>
 
+#include <cstdint>
 #include <map>
 #include <optional>
 #include <string>
@@ -26,8 +27,10 @@ struct ProgramStart {
 struct ProgramEnd {
   int exitStatus = -1;  ///< -1 when a signal ended the process.
   int signal = 0;       ///< The signal that ended the process; 0 for none.
-  std::string output;   ///< All of standard output, unless a file took it.
-  std::string errors;   ///< All of standard error.
+  /// The most memory that was resident, no less than the test had when it started the program.
+  std::int64_t peakBytes = 0;
+  std::string output;  ///< All of standard output, unless a file took it.
+  std::string errors;  ///< All of standard error.
 };
 
 /// A program that runs beside the test. Its standard input and output are pipes of the test.

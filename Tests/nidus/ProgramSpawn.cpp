@@ -2,6 +2,7 @@
 
 #include <fcntl.h>
 #include <spawn.h>
+#include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -100,8 +101,11 @@ pid_t spawnOnTerminal(const ProgramStart& start, const std::string& terminal) {
 
 ProgramEnd waitForEnd(pid_t process) {
   int status = 0;
-  waitpid(process, &status, 0);
+  rusage usage = {};
+  wait4(process, &status, 0, &usage);
   ProgramEnd end;
+  constexpr std::int64_t kKilobyte = 1024;
+  end.peakBytes = usage.ru_maxrss * kKilobyte;
   if (WIFEXITED(status)) end.exitStatus = WEXITSTATUS(status);
   if (WIFSIGNALED(status)) end.signal = WTERMSIG(status);
   return end;
