@@ -184,12 +184,14 @@ class SearchNarrowing {
     const NDString type = property(command_.metadata(), &NDNAPMetadata::mapFromAssistantServiceName,
                                    filter_.serviceType());
     if (!type) return false;
-    ObjectList services = matching(list_, [&type](const HomeObjectRecord& object) {
+    const auto isAssociated = [&type](const HomeObjectRecord& object) {
       return isEqual(object.objectAssociatedServiceType, type);
-    });
-    append(services, matching(list_, [&type](const HomeObjectRecord& object) {
-             return isEqual(object.objectServiceType, type);
-           }));
+    };
+    const auto isOfType = [&type](const HomeObjectRecord& object) {
+      return isEqual(object.objectServiceType, type);
+    };
+    ObjectList services = matching(list_, isAssociated);
+    append(services, matching(list_, isOfType));
     keep("serviceType", std::move(services));
     return true;
   }
@@ -274,10 +276,11 @@ ObjectList NDAssistantCommand::filterObjects_byAttribute(const ObjectList& objec
                                                          const NDString& attribute) const {
   const NDString type =
       property(metadata_, &NDNAPMetadata::mapReadCharcteristicFromAssistantName, attribute);
-  return matching(objects, [&type](const HomeObjectRecord& object) {
+  const auto hasType = [&type](const HomeObjectRecord& object) {
     return object.objectType == VAHAEntityTypeSERVICEValue &&
            contains(object.objectCharacteristics, type);
-  });
+  };
+  return matching(objects, hasType);
 }
 
 NDAssistantCommand::CharacteristicList NDAssistantCommand::filterObjects_forcharacteristicType(

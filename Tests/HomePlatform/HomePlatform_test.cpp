@@ -436,6 +436,9 @@ TEST(HomePlatformTest, EveryHeldManagerReportsAfterItsHold) {
       if (!isAsked.load()) ++early_;
       if (manager->homes().size() == 1) ++reported_;
     }
+    void homeManagerWillNotUpdateHomes(const std::shared_ptr<NDHomeManager>& /*manager*/) override {
+      ADD_FAILURE() << "the platform was not shut down";
+    }
     std::atomic<bool> isAsked{false};
 
    private:

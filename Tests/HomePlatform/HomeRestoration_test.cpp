@@ -19,8 +19,6 @@ namespace {
 namespace fs = std::filesystem;
 using testing::HasSubstr;
 
-constexpr std::chrono::milliseconds kNoWaiting{0};
-
 /// A data folder with homes named "Second" and a backup of homes named "First".
 class HomeRestorationTest : public testing::Test {
  protected:

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <string_view>
 #include <vector>
 
@@ -15,6 +16,9 @@ inline constexpr std::string_view kRoomID = "9E01A3C4-0000-4000-8000-00000000000
 inline constexpr std::string_view kLampID = "9E01A3C4-0000-4000-8000-000000000003";
 inline constexpr std::string_view kDoorID = "9E01A3C4-0000-4000-8000-000000000004";
 inline constexpr std::string_view kSceneID = "9E01A3C4-0000-4000-8000-000000000005";
+
+/// For tests that are alone with their database, or want to hear at once that they are not.
+inline constexpr std::chrono::milliseconds kNoWaiting{0};
 
 /// The UUID of that text, which must be one.
 [[nodiscard]] NDUUID uuidOf(std::string_view text);

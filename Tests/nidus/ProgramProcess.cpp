@@ -13,8 +13,6 @@
 namespace nidus {
 namespace {
 
-constexpr int kPatienceMs = 60000;
-
 int openFile(const std::string& file, int flags) {
   const int number = open(file.c_str(), flags | O_CLOEXEC, 0600);
   if (number < 0) throw std::runtime_error("can not open " + file);

@@ -9,6 +9,9 @@
 
 namespace nidus {
 
+/// How long a program that is alive may be silent, in milliseconds.
+inline constexpr int kPatienceMs = 60000;
+
 /// Starts a program with these files as its standard ones.
 [[nodiscard]] pid_t spawnProgram(const ProgramStart& start, const std::array<int, 3>& files);
 

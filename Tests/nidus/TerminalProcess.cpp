@@ -17,7 +17,6 @@
 namespace nidus {
 namespace {
 
-constexpr int kPatienceMs = 60000;
 constexpr unsigned short kRows = 24;
 
 int openTerminal() {

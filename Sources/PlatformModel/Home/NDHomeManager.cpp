@@ -6,9 +6,6 @@ namespace nidus {
 
 NDHomeManagerDelegate::~NDHomeManagerDelegate() = default;
 
-void NDHomeManagerDelegate::homeManagerWillNotUpdateHomes(
-    const std::shared_ptr<NDHomeManager>& /*manager*/) {}
-
 NDHomeManager::~NDHomeManager() = default;
 
 std::shared_ptr<NDHomeManager> NDHomeManager::create() {

@@ -19,7 +19,7 @@ class ND_EXPORT NDHomeManagerDelegate {
   virtual void homeManagerDidUpdateHomes(const std::shared_ptr<NDHomeManager>& manager) = 0;
   /// The platform is being shut down and will never report homes again: whoever waits for them
   /// lets go of what it keeps for that, without calling it. `manager` is never null.
-  virtual void homeManagerWillNotUpdateHomes(const std::shared_ptr<NDHomeManager>& manager);
+  virtual void homeManagerWillNotUpdateHomes(const std::shared_ptr<NDHomeManager>& manager) = 0;
 };
 
 /// Loads the homes and keeps them. Implemented by the platform.

@@ -9,7 +9,7 @@
 
 namespace nidus {
 
-ExitStatus changeHomes(Workspace& workspace, const HomeChange& change) {
+ExitStatus changeHomes(Workspace& workspace, const ChangeOfHomes& change) {
   const auto session = workspace.home();
   if (!session) return report(session.failure());
   HomePlatform& platform = (*session)->platform();

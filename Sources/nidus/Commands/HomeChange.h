@@ -20,10 +20,10 @@ struct HomeWording {
 };
 
 /// Changes homes and gives what was done, in a sentence without its end; or fails.
-using HomeChange =
+using ChangeOfHomes =
     std::function<Result<std::string>(std::vector<HomeData>& homes, const HomeWording& wording)>;
 
 /// Makes a change of the homes in the database, whole or not at all, and prints what was done.
-[[nodiscard]] ExitStatus changeHomes(Workspace& workspace, const HomeChange& change);
+[[nodiscard]] ExitStatus changeHomes(Workspace& workspace, const ChangeOfHomes& change);
 
 }  // namespace nidus

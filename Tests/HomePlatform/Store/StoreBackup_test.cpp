@@ -21,8 +21,6 @@ using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
-constexpr std::chrono::milliseconds kNoWaiting{0};
-
 /// A database in a folder of its own, and its backups.
 class StoreBackupTest : public testing::Test {
  protected:

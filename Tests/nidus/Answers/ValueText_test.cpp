@@ -24,7 +24,7 @@ NDDictionary text(const char* value) {
   return valueOf("string", NDDictionaryValue(NDString(value)));
 }
 
-struct ValueCase {
+struct ValueTextCase {
   const char* label;
   NDDictionary value;
   const char* attribute;
@@ -32,7 +32,7 @@ struct ValueCase {
 };
 
 TEST(ValueTextTest, SaysValuesAsPeopleDo) {
-  const ValueCase table[] = {
+  const ValueTextCase table[] = {
       {"none", {}, "POWER", ""},
       {"switched on", boolean(true), "POWER", "on"},
       {"switched off", boolean(false), "MUTE", "off"},
@@ -53,7 +53,7 @@ TEST(ValueTextTest, SaysValuesAsPeopleDo) {
       {"unit of somebody else", integer(1, "\x1b"), "BRIGHTNESS", "1 \\x1b"},
   };
   const Vocabulary vocabulary = builtInVocabulary();
-  for (const ValueCase& value : table) {
+  for (const ValueTextCase& value : table) {
     SCOPED_TRACE(value.label);
     EXPECT_EQ(valueText(value.value, value.attribute, vocabulary), value.text);
   }

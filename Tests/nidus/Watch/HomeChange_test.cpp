@@ -65,13 +65,13 @@ TEST_F(ChangesBetweenTest, LeavesOutWhatNobodyKnowsYet) {
 }
 
 TEST_F(ChangesBetweenTest, ShowsUnitsAndWordsOfTheVocabulary) {
-  struct ValueCase {
+  struct ShownValue {
     const char* type;
     NDValueRef before;
     NDValueRef after;
     const char* line;
   };
-  const std::vector<ValueCase> table = {
+  const std::vector<ShownValue> table = {
       {"brightness", NDValue::integer(40), NDValue::integer(65), "BRIGHTNESS  40 % -> 65 %"},
       {"current-temperature", NDValue::floating(20.5F), NDValue::floating(21),
        "TEMPERATURE  20.5 °C -> 21 °C"},
@@ -80,7 +80,7 @@ TEST_F(ChangesBetweenTest, ShowsUnitsAndWordsOfTheVocabulary) {
       {"current-climate-mode", NDValue::integer(0), NDValue::integer(1),
        "CLIMATE_MODE  off -> heat"},
   };
-  for (const ValueCase& row : table) {
+  for (const ShownValue& row : table) {
     SCOPED_TRACE(row.line);
     HomeDataBuilder builder("Cottage");
     builder.light("Lamp").characteristic(characteristicTypeOf(row.type), row.before);
