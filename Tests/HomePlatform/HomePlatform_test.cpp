@@ -330,6 +330,14 @@ TEST(HomePlatformTest, MemoryHoldsGivenHomesAndWords) {
   EXPECT_FALSE(isConfigured(*platform));
 }
 
+TEST(HomePlatformTest, HomesInMemoryCannotBeWatched) {
+  const OpenPlatform platform(onCaller());
+  const auto watch = platform->watchHomes([](const auto&) { FAIL() << "nothing is watched"; });
+  ASSERT_FALSE(watch);
+  EXPECT_EQ(watch.failure().kind, Failure::Kind::badInput);
+  EXPECT_THAT(watch.failure().message, HasSubstr("open those of a data folder"));
+}
+
 TEST(HomePlatformTest, FolderIgnoresHomesForMemory) {
   const TestFolder folder;
   HomePlatformOptions options = inFolder(folder);

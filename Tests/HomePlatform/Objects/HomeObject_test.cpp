@@ -6,6 +6,7 @@
 #include "HomePlatform/Drivers/PlatformErrors.h"
 #include "HomePlatform/PlatformProbe.h"
 #include "PlatformModel/Home/NDLookUp.h"
+#include "Support/TestCharacteristic.h"
 
 namespace nidus {
 namespace {
@@ -148,6 +149,23 @@ TEST_F(HomeObjectTest, ResponsesNameWhatWasAsked) {
       });
   platform_->drain();
   EXPECT_EQ(answered, asked);
+}
+
+TEST_F(HomeObjectTest, CharacteristicOfAnotherMakeWithoutHomeIsUnreachable) {
+  open(sampleHome());
+  const auto foreign = std::make_shared<TestCharacteristic>(CharacteristicSpec("another.make"),
+                                                            powerAddress().characteristic,
+                                                            std::weak_ptr<NDService>());
+  std::vector<std::int64_t> codes;
+  home_->readCharacteristicValues_withCompletionHandler(
+      {foreign, characteristicAt(home_, powerAddress())},
+      [&codes](const auto&, const auto& responses) {
+        for (const auto& response : responses) {
+          codes.push_back(response.error ? response.error->code : 0);
+        }
+      });
+  platform_->drain();
+  EXPECT_THAT(codes, ElementsAre(kNDErrorUnreachable, 0));
 }
 
 void addScene(HomeData& home, std::vector<SceneActionData> actions) {
