@@ -27,13 +27,11 @@ namespace {
 
 namespace fs = std::filesystem;
 
-constexpr std::chrono::milliseconds kNoDelay{0};
-
 std::string databaseIn(const fs::path& folder) { return (folder / "home.db").string(); }
 
 /// What the engine finds wrong with the file; "ok" when there is nothing.
 std::string integrityOf(const fs::path& folder) {
-  Database database(databaseIn(folder), kNoDelay);
+  Database database(databaseIn(folder), kNoWaiting);
   Statement check(database, "PRAGMA integrity_check");
   check.step();
   const std::string result(check.text(0));
@@ -42,7 +40,7 @@ std::string integrityOf(const fs::path& folder) {
 }
 
 std::string homesIn(const fs::path& folder) {
-  const auto store = HomeStore::open(databaseIn(folder), kNoDelay);
+  const auto store = HomeStore::open(databaseIn(folder), kNoWaiting);
   if (!store) return store.failure().message;
   const auto homes = (*store)->loadHomes();
   return homes ? documentOf(*homes) : homes.failure().message;
@@ -66,7 +64,7 @@ using StoreAction = std::function<Status(HomeStore& store)>;
 
 std::function<bool(const fs::path&)> withStore(StoreAction action) {
   return [action = std::move(action)](const fs::path& folder) {
-    const auto store = HomeStore::open(databaseIn(folder), kNoDelay);
+    const auto store = HomeStore::open(databaseIn(folder), kNoWaiting);
     return store && !action(**store);
   };
 }
@@ -140,15 +138,15 @@ std::vector<std::string> stepsWithMigration() {
 bool migrate(const fs::path& folder) {
   try {
     const std::string file = databaseIn(folder);
-    Database database(file, kNoDelay);
-    return !migrateStore(database, file, stepsWithMigration(), kNoDelay);
+    Database database(file, kNoWaiting);
+    return !migrateStore(database, file, stepsWithMigration(), kNoWaiting);
   } catch (const DatabaseError&) {
     return false;
   }
 }
 
 std::string migratedContents(const fs::path& folder) {
-  Database database(databaseIn(folder), kNoDelay);
+  Database database(databaseIn(folder), kNoWaiting);
   Statement names(database, "SELECT group_concat(name) FROM accessory");
   names.step();
   const std::int64_t columns =
@@ -186,7 +184,7 @@ void beginWithDamage(const fs::path& folder) {
 }
 
 bool restore(const fs::path& folder) {
-  return static_cast<bool>(restoreHomes(folder, backupsOf(databaseIn(folder)).front(), kNoDelay));
+  return static_cast<bool>(restoreHomes(folder, backupsOf(databaseIn(folder)).front(), kNoWaiting));
 }
 
 std::string damagedOrHomesIn(const fs::path& folder) {
@@ -350,7 +348,7 @@ class StoreReadFaultTest : public testing::Test {
 
   bool isMetByFault(const std::function<void()>& arm, const std::function<bool()>& disarm) {
     arm();
-    const auto store = HomeStore::open(databaseIn(folder_.path()), kNoDelay);
+    const auto store = HomeStore::open(databaseIn(folder_.path()), kNoWaiting);
     const auto homes = store ? (*store)->loadHomes() : store.failure();
     const bool wasMet = disarm();
     EXPECT_EQ(homes ? documentOf(*homes) : expected_, expected_);
@@ -376,7 +374,7 @@ TEST(StoreAfterFaultTest, WritesAgain) {
   const TestFolder folder;
   beginWithHome(folder.path());
   FaultyDisk disk;
-  const auto store = HomeStore::open(databaseIn(folder.path()), kNoDelay);
+  const auto store = HomeStore::open(databaseIn(folder.path()), kNoWaiting);
   for (std::int64_t number = 1;; ++number) {
     disk.arm({FaultyDisk::Kind::error, number, false});
     static_cast<void>(importRandomHomes(**store));
