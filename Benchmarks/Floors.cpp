@@ -32,6 +32,14 @@ std::shared_ptr<VAHAEntity> entityByHand(const AnswerTexts& texts) {
   return entity;
 }
 
+class ConstantDevice final : public AnsweringDevice {
+ public:
+  [[nodiscard]] DeviceResponse read() const override { return {0, value_}; }
+
+ private:
+  const NDValueRef value_ = NDValue::integer(40);
+};
+
 }  // namespace
 
 FlatRecords flatRecords(const NDDictionaryList& records) {
@@ -132,6 +140,14 @@ VAHACommandCompleted::Results resultsByHand(const std::vector<AnswerTexts>& text
     results.push_back(std::move(result));
   }
   return results;
+}
+
+AnsweringDevices answeringDevices(std::size_t count) {
+  AnsweringDevices devices;
+  for (std::size_t index = 0; index < count; ++index) {
+    devices.push_back(std::make_unique<ConstantDevice>());
+  }
+  return devices;
 }
 
 }  // namespace nidus

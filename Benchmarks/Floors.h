@@ -62,4 +62,21 @@ struct AnswerTexts {
 /// One result, with a value and an entity that has a fresh random identifier, for each.
 [[nodiscard]] VAHACommandCompleted::Results resultsByHand(const std::vector<AnswerTexts>& texts);
 
+/// What a device answers.
+struct DeviceResponse {
+  std::int64_t code = 0;
+  NDValueRef value;
+};
+
+/// A device that has one value and answers with it in one virtual call. Who calls it must not see
+/// what kinds of devices there are, or the compiler saves the call.
+class AnsweringDevice {
+ public:
+  virtual ~AnsweringDevice() = default;
+  [[nodiscard]] virtual DeviceResponse read() const = 0;
+};
+using AnsweringDevices = std::vector<std::unique_ptr<AnsweringDevice>>;
+
+[[nodiscard]] AnsweringDevices answeringDevices(std::size_t count);
+
 }  // namespace nidus

@@ -94,4 +94,8 @@ void everySize(benchmark::internal::Benchmark* benchmark) {
   benchmark->Complexity();
 }
 
+void everySizeTo10000(benchmark::internal::Benchmark* benchmark) {
+  benchmark->RangeMultiplier(10)->Range(10, 10'000)->Iterations(1)->UseManualTime()->Complexity();
+}
+
 }  // namespace nidus

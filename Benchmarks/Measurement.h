@@ -45,5 +45,8 @@ void measureRow(benchmark::State& state, Row row, const Work& ours, const Work& 
 /// Applies the sizes of all homes to a benchmark that measures by itself, and asks for its growth.
 void everySize(benchmark::internal::Benchmark* benchmark);
 void everySizeWithoutGrowth(benchmark::internal::Benchmark* benchmark);
+/// The same up to 10,000 services: for what writes all of them to a disk first, or walks objects
+/// that no cache holds any more.
+void everySizeTo10000(benchmark::internal::Benchmark* benchmark);
 
 }  // namespace nidus

@@ -1,7 +1,5 @@
 #include "HomePlatform/Drivers/SimulatedDriver.h"
 
-#include <algorithm>
-#include <string_view>
 #include <utility>
 
 #include "HomePlatform/Drivers/PlatformErrors.h"
@@ -11,7 +9,6 @@
 #include "HomePlatform/Objects/HomeObject.h"
 #include "HomePlatform/Objects/ServiceObject.h"
 #include "HomePlatform/Store/ValueConversion.h"
-#include "PlatformModel/Home/NDCharacteristicConstants.h"
 #include "PlatformModel/Home/NDLookUp.h"
 
 namespace nidus {
@@ -21,6 +18,7 @@ struct SimulatedDriver::Batch {
   NDUUID homeID;
   std::shared_ptr<const HomeEdition> edition = nullptr;
   const HomeObject* home = nullptr;  ///< Null when there is no such home.
+  std::size_t near = 0;              ///< Where in the home the last accessory was found.
   DriverAnswers answers = {};
   std::vector<ValueChange> changes = {};
   std::vector<std::pair<std::size_t, CharacteristicAddress>> kept = {};  ///< What needs `changes`.
@@ -38,11 +36,6 @@ namespace {
 
 constexpr std::int64_t kSuccess = 0;
 
-bool hasProperty(const CharacteristicData& characteristic, std::string_view property) {
-  const auto& properties = characteristic.properties;
-  return std::find(properties.begin(), properties.end(), property) != properties.end();
-}
-
 NDValueRef convert(const CharacteristicData& characteristic, const NDValueRef& value) {
   return convertToFormat(value,
                          characteristic.metadata ? characteristic.metadata->format : nullptr);
@@ -53,13 +46,6 @@ bool isOutOfRange(const CharacteristicData& characteristic, const NDValue& value
   const auto& metadata = characteristic.metadata;
   return metadata && (value.compare(metadata->minimumValue) == std::partial_ordering::less ||
                       value.compare(metadata->maximumValue) == std::partial_ordering::greater);
-}
-
-/// The same value in the same kind, so that keeping it would change nothing.
-bool isSame(const NDValueRef& a, const NDValueRef& b) {
-  if (a == b) return true;
-  return a && b && a->isEqual(*b) && a->isBoolean() == b->isBoolean() &&
-         a->isInteger() == b->isInteger();
 }
 
 }  // namespace
@@ -105,6 +91,7 @@ bool SimulatedDriver::begin(Batch& batch) const {
   }
   batch.edition = std::move(*edition);
   batch.home = batch.edition->find(batch.homeID).get();
+  batch.near = 0;
   return true;
 }
 
@@ -130,6 +117,10 @@ DriverAnswers SimulatedDriver::writeBatch(const NDUUID& home,
   return std::move(batch.answers);
 }
 
+FoundCharacteristic SimulatedDriver::find(Batch& batch, const CharacteristicAddress& address) {
+  return batch.home ? batch.home->find(address, batch.near) : FoundCharacteristic();
+}
+
 /// What stands before a read and a write alike.
 std::int64_t SimulatedDriver::refusal(const Target& target, std::int32_t FaultData::*fault) const {
   if (const std::int32_t code = target.characteristic.faults.*fault) return code;
@@ -140,32 +131,27 @@ std::int64_t SimulatedDriver::refusal(const Target& target, std::int32_t FaultDa
 }
 
 std::int64_t SimulatedDriver::readOne(Batch& batch, const CharacteristicAddress& address) const {
-  const FoundCharacteristic found = batch.home ? batch.home->find(address) : FoundCharacteristic();
+  const FoundCharacteristic found = find(batch, address);
   if (!found.characteristic) return kNDErrorUnreachable;
   const Target target{found.accessory->data(), *found.service, found.characteristic->data(),
                       *found.characteristic};
   if (const std::int64_t code = refusal(target, &FaultData::read)) return code;
-  if (!hasProperty(target.characteristic, NDCharacteristicPropertyReadable)) {
-    return kNDErrorNotReadable;
-  }
-  const auto [value, deviceValue] = target.object.values();
-  if (!isSame(value, deviceValue)) {
+  if (!target.object.isReadable()) return kNDErrorNotReadable;
+  if (!target.object.isCurrent()) {
     batch.kept.emplace_back(batch.answers.size(), address);
-    batch.changes.push_back({batch.homeID, address, deviceValue, std::nullopt});
+    batch.changes.push_back(
+        {batch.homeID, address, target.object.values().deviceValue, std::nullopt});
   }
   return kSuccess;
 }
 
 std::int64_t SimulatedDriver::writeOne(Batch& batch, const DriverWrite& write) const {
-  const FoundCharacteristic found =
-      batch.home ? batch.home->find(write.target) : FoundCharacteristic();
+  const FoundCharacteristic found = find(batch, write.target);
   if (!found.characteristic) return kNDErrorUnreachable;
   const Target target{found.accessory->data(), *found.service, found.characteristic->data(),
                       *found.characteristic};
   if (const std::int64_t code = refusal(target, &FaultData::write)) return code;
-  if (!hasProperty(target.characteristic, NDCharacteristicPropertyWritable)) {
-    return kNDErrorNotWritable;
-  }
+  if (!target.object.isWritable()) return kNDErrorNotWritable;
   const NDValueRef value = convert(target.characteristic, write.value);
   if (!value) return kNDErrorWrongType;
   if (isOutOfRange(target.characteristic, *value)) return kNDErrorOutOfRange;
@@ -207,8 +193,7 @@ bool SimulatedDriver::isOutdated(const Batch& batch) const {
 void SimulatedDriver::answerGoneTargets(Batch& batch) const {
   if (!begin(batch)) return;
   for (const auto& [index, address] : batch.kept) {
-    const bool isThere = batch.home && batch.home->find(address).characteristic;
-    if (!isThere) batch.answers[index] = kNDErrorUnreachable;
+    if (!find(batch, address).characteristic) batch.answers[index] = kNDErrorUnreachable;
   }
 }
 

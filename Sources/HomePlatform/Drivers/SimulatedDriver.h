@@ -40,6 +40,7 @@ class SimulatedDriver final : public AccessoryDriver,
                                         const std::vector<CharacteristicAddress>& targets) const;
   [[nodiscard]] DriverAnswers writeBatch(const NDUUID& home,
                                          const std::vector<DriverWrite>& writes) const;
+  [[nodiscard]] static FoundCharacteristic find(Batch& batch, const CharacteristicAddress& address);
   [[nodiscard]] std::int64_t refusal(const Target& target, std::int32_t FaultData::*fault) const;
   [[nodiscard]] std::int64_t readOne(Batch& batch, const CharacteristicAddress& address) const;
   [[nodiscard]] std::int64_t writeOne(Batch& batch, const DriverWrite& write) const;

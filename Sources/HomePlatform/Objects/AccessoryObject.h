@@ -1,13 +1,25 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
+#include <vector>
 
 #include "HomePlatform/Objects/HomePart.h"
 #include "HomePlatform/Store/HomeData.h"
 
 namespace nidus {
 
+class AccessoryObject;
+class CharacteristicObject;
 class ServiceObject;
+
+/// A characteristic with all that holds it; all null when there is none. They live as long as the
+/// accessory.
+struct FoundCharacteristic {
+  const AccessoryObject* accessory = nullptr;
+  const ServiceObject* service = nullptr;
+  CharacteristicObject* characteristic = nullptr;
+};
 
 /// One accessory of a loaded home.
 class AccessoryObject final : public HomePart<NDAccessory, AccessoryData> {
@@ -23,12 +35,24 @@ class AccessoryObject final : public HomePart<NDAccessory, AccessoryData> {
   [[nodiscard]] const NDArray<NDService>& services() const override { return services_; }
   [[nodiscard]] std::shared_ptr<NDRoom> room() const override { return room_.lock(); }
 
-  /// The service of that instance ID; null when there is none.
-  [[nodiscard]] std::shared_ptr<NDService> find(std::int64_t instanceID) const;
+  /// The service of that instance ID; null when there is none. Valid as long as the accessory.
+  [[nodiscard]] const std::shared_ptr<NDService>& findService(std::int64_t instanceID) const;
+  /// The characteristic of those instance IDs.
+  [[nodiscard]] FoundCharacteristic find(std::int64_t service, std::int64_t characteristic) const;
 
  private:
+  void listCharacteristics();
+
   const std::weak_ptr<NDRoom> room_;
-  NDArray<NDService> services_;  ///< Complete when `make` returns.
+  // Complete when `make` returns.
+  NDArray<NDService> services_;
+  /// All characteristics side by side, because batches look up one after the other.
+  struct Place {
+    std::int64_t serviceID;
+    std::int64_t characteristicID;
+    FoundCharacteristic found;
+  };
+  std::vector<Place> places_;
 };
 
 }  // namespace nidus

@@ -1,7 +1,8 @@
 #pragma once
 
+#include <atomic>
 #include <memory>
-#include <utility>
+#include <optional>
 
 #include "HomePlatform/Objects/MetadataObject.h"
 #include "HomePlatform/Store/HomeData.h"
@@ -34,22 +35,31 @@ class CharacteristicObject final : public NDCharacteristic {
   [[nodiscard]] const CharacteristicData& data() const { return *data_; }
   [[nodiscard]] const CharacteristicAddress& address() const { return address_; }
 
+  [[nodiscard]] bool isReadable() const noexcept { return isReadable_; }
+  [[nodiscard]] bool isWritable() const noexcept { return isWritable_; }
+
   /// The cached value and what the accessory would answer now.
   struct Values {
     NDValueRef value;
     NDValueRef deviceValue;
   };
   [[nodiscard]] Values values() const;
-  void setValue(NDValueRef value);
-  void setDeviceValue(NDValueRef deviceValue);
+  /// Takes the values that there are.
+  void setValues(std::optional<NDValueRef> value, std::optional<NDValueRef> deviceValue);
+  /// Whether the accessory would answer with the cached value; takes no lock.
+  [[nodiscard]] bool isCurrent() const noexcept { return isCurrent_; }
 
  private:
   const std::shared_ptr<const CharacteristicData> data_;
   const CharacteristicAddress address_;
   const std::weak_ptr<NDService> service_;
   const std::shared_ptr<const NDCharacteristicMetadata> metadata_;
+  // As the properties say.
+  const bool isReadable_;
+  const bool isWritable_;
   mutable NDMutex mutex_;
   Values values_ ND_GUARDED_BY(mutex_);
+  std::atomic<bool> isCurrent_;
 };
 
 }  // namespace nidus

@@ -59,11 +59,11 @@ std::shared_ptr<NDRoom> HomeBuilding::roomOf(const AccessoryData& accessory) con
 void HomeBuilding::buildAccessories() {
   std::vector<std::shared_ptr<NDAccessory>> accessories;
   accessories.reserve(data_->accessories.size());
-  home_->accessoriesByID_.reserve(data_->accessories.size());
+  home_->accessoryIndexes_.reserve(data_->accessories.size());
   for (const AccessoryData& data : data_->accessories) {
     auto accessory = AccessoryObject::make(std::shared_ptr<const AccessoryData>(data_, &data),
                                            home_, roomOf(data));
-    home_->accessoriesByID_.emplace(data.uuid, accessory.get());
+    home_->accessoryIndexes_.emplace(data.uuid, accessories.size());
     accessories.push_back(std::move(accessory));
   }
   home_->accessories_ = NDArray<NDAccessory>(std::move(accessories));
@@ -75,11 +75,10 @@ void HomeBuilding::buildGroups() {
   for (const ServiceGroupData& group : data_->serviceGroups) {
     std::vector<std::shared_ptr<NDService>> services;
     for (const ServiceAddress& address : group.services) {
-      const auto accessory = home_->accessoriesByID_.find(address.accessory);
-      if (accessory == home_->accessoriesByID_.end()) continue;
-      if (auto service = accessory->second->find(address.service)) {
-        services.push_back(std::move(service));
-      }
+      const auto accessory = home_->accessoryIndexes_.find(address.accessory);
+      if (accessory == home_->accessoryIndexes_.end()) continue;
+      const auto& service = home_->accessory(accessory->second).findService(address.service);
+      if (service) services.push_back(service);
     }
     groups.push_back(
         std::make_shared<ServiceGroupObject>(std::shared_ptr<const ServiceGroupData>(data_, &group),

@@ -1,5 +1,6 @@
 #include "HomePlatform/Objects/HomeObject.h"
 
+#include <algorithm>
 #include <cstring>
 #include <utility>
 
@@ -7,7 +8,6 @@
 #include "HomePlatform/Objects/CharacteristicObject.h"
 #include "HomePlatform/Objects/HomeBuilding.h"
 #include "HomePlatform/Objects/HomeCalls.h"
-#include "HomePlatform/Objects/ServiceObject.h"
 
 namespace nidus {
 
@@ -44,23 +44,39 @@ void HomeObject::executeActionSet_completionHandler(std::shared_ptr<NDActionSet>
   }
 }
 
+FoundCharacteristic HomeObject::find(const CharacteristicAddress& address,
+                                     std::size_t& near) const {
+  const AccessoryObject* found = findAccessory(address.accessory, near);
+  if (!found) return {};
+  return found->find(address.service, address.characteristic);
+}
+
 FoundCharacteristic HomeObject::find(const CharacteristicAddress& address) const {
-  const auto accessory = accessoriesByID_.find(address.accessory);
-  if (accessory == accessoriesByID_.end()) return {};
-  const auto service = accessory->second->find(address.service);
-  if (!service) return {};
-  const auto& object = static_cast<const ServiceObject&>(*service);
-  CharacteristicObject* characteristic = object.find(address.characteristic);
-  if (!characteristic) return {};
-  return {accessory->second, &object, characteristic};
+  std::size_t near = 0;
+  return find(address, near);
+}
+
+const AccessoryObject& HomeObject::accessory(std::size_t index) const {
+  return static_cast<const AccessoryObject&>(*accessories_[index]);
+}
+
+const AccessoryObject* HomeObject::findAccessory(const NDUUID& id, std::size_t& near) const {
+  const std::size_t end = std::min(near + 2, accessories_.size());
+  for (std::size_t index = near; index < end; ++index) {
+    if (accessory(index).data().uuid != id) continue;
+    near = index;
+    return &accessory(index);
+  }
+  const auto found = accessoryIndexes_.find(id);
+  if (found == accessoryIndexes_.end()) return nullptr;
+  near = found->second;
+  return &accessory(near);
 }
 
 void HomeObject::apply(const ValueChange& change) const {
   if (change.home != uuid()) return;
   CharacteristicObject* characteristic = find(change.address).characteristic;
-  if (!characteristic) return;
-  if (change.value) characteristic->setValue(*change.value);
-  if (change.deviceValue) characteristic->setDeviceValue(*change.deviceValue);
+  if (characteristic) characteristic->setValues(change.value, change.deviceValue);
 }
 
 void HomeObject::takeValues(const HomeObject& newer) const {
@@ -71,8 +87,7 @@ void HomeObject::takeValues(const HomeObject& newer) const {
         const CharacteristicObject* other = newer.find(own.address()).characteristic;
         if (!other) continue;
         CharacteristicObject::Values values = other->values();
-        own.setValue(std::move(values.value));
-        own.setDeviceValue(std::move(values.deviceValue));
+        own.setValues(std::move(values.value), std::move(values.deviceValue));
       }
     }
   }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <memory>
 #include <unordered_map>
 #include <vector>
@@ -10,17 +11,8 @@
 namespace nidus {
 
 class AccessoryObject;
-class CharacteristicObject;
 class HomeCalls;
-class ServiceObject;
-
-/// A characteristic with all that holds it; all null when there is none. They live as long as the
-/// home.
-struct FoundCharacteristic {
-  const AccessoryObject* accessory = nullptr;
-  const ServiceObject* service = nullptr;
-  CharacteristicObject* characteristic = nullptr;
-};
+struct FoundCharacteristic;
 
 /// One loaded home. Its calls go to `HomeCalls`; once those are gone they are never answered.
 class HomeObject final : public NDHome {
@@ -51,6 +43,11 @@ class HomeObject final : public NDHome {
 
   /// As it was loaded: its values are out of date.
   [[nodiscard]] const HomeData& data() const { return *data_; }
+  /// Batches mostly go through a home in its order: `near` is where the accessory of the last one
+  /// was found, and is looked at first, with the place behind it.
+  /// What is found lives as long as the home.
+  [[nodiscard]] FoundCharacteristic find(const CharacteristicAddress& address,
+                                         std::size_t& near) const;
   [[nodiscard]] FoundCharacteristic find(const CharacteristicAddress& address) const;
   /// Takes a value that has been kept, if it is of this home.
   void apply(const ValueChange& change) const;
@@ -59,6 +56,9 @@ class HomeObject final : public NDHome {
 
  private:
   friend class HomeBuilding;
+  [[nodiscard]] const AccessoryObject& accessory(std::size_t index) const;
+  [[nodiscard]] const AccessoryObject* findAccessory(const NDUUID& id, std::size_t& near) const;
+
   const std::shared_ptr<const HomeData> data_;
   const std::weak_ptr<HomeCalls> calls_;
   // Complete when `make` returns.
@@ -69,7 +69,7 @@ class HomeObject final : public NDHome {
   NDArray<NDServiceGroup> groups_;
   NDArray<NDActionSet> actionSets_;
   NDArray<NDTrigger> triggers_;
-  std::unordered_map<NDUUID, const AccessoryObject*> accessoriesByID_;
+  std::unordered_map<NDUUID, std::size_t> accessoryIndexes_;
 };
 
 }  // namespace nidus

@@ -26,14 +26,4 @@ ServiceObject::ServiceObject(std::shared_ptr<const ServiceData> data,
                              std::weak_ptr<NDAccessory> accessory)
     : data_(std::move(data)), accessory_(std::move(accessory)) {}
 
-CharacteristicObject* ServiceObject::find(std::int64_t instanceID) const {
-  const auto& all = data_->characteristics;
-  for (std::size_t index = 0; index < all.size(); ++index) {
-    if (all[index].instanceID == instanceID) {
-      return static_cast<CharacteristicObject*>(characteristics_[index].get());
-    }
-  }
-  return nullptr;
-}
-
 }  // namespace nidus

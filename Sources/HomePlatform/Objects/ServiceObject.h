@@ -8,8 +8,6 @@
 
 namespace nidus {
 
-class CharacteristicObject;
-
 /// One service of a loaded home.
 class ServiceObject final : public NDService {
  public:
@@ -32,10 +30,6 @@ class ServiceObject final : public NDService {
   [[nodiscard]] std::shared_ptr<NDAccessory> accessory() const override {
     return accessory_.lock();
   }
-
-  /// The characteristic of that instance ID; null when there is none. It lives as long as the
-  /// service.
-  [[nodiscard]] CharacteristicObject* find(std::int64_t instanceID) const;
 
  private:
   const std::shared_ptr<const ServiceData> data_;

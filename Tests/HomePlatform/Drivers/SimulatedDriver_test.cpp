@@ -211,6 +211,23 @@ TEST_F(SimulatedDriverTest, AnswersInOrderAsked) {
   EXPECT_EQ(answer.calls, 1);
 }
 
+TEST_F(SimulatedDriverTest, FindsAccessoriesInAnyOrder) {
+  HomeData home = sampleHome();
+  std::vector<CharacteristicAddress> targets;
+  for (std::uint8_t number = 0; number < 4; ++number) {
+    AccessoryData lamp = lampOf(home);
+    lamp.uuid = NDUUID({number});
+    lamp.faults.read = 60 + number;
+    targets.push_back({lamp.uuid, brightnessAddress().service, brightnessAddress().characteristic});
+    home.accessories.push_back(std::move(lamp));
+  }
+  open(home);
+  const auto answer =
+      read(*platform_, home_,
+           {targets[3], targets[0], targets[1], targets[1], targets[3], brightnessAddress()});
+  EXPECT_THAT(answer.codes, ElementsAre(63, 60, 61, 61, 63, 0));
+}
+
 TEST_F(SimulatedDriverTest, LastWriteOfOneBatchWins) {
   open(sampleHome());
   const auto answer = write(*platform_, home_,
