@@ -13,8 +13,6 @@
 
 namespace nidus {
 
-extern const std::string_view kBuiltInVocabulary;
-
 namespace {
 
 NDString optionalText(JsonObject& object, std::string_view key) {
@@ -175,8 +173,6 @@ Result<Vocabulary> extendBuiltIn(std::istream& file, const std::filesystem::path
 }
 
 }  // namespace
-
-Vocabulary builtInVocabulary() { return merge({}, parseJson(kBuiltInVocabulary)); }
 
 Result<Vocabulary> mergeVocabulary(Vocabulary base, std::string_view text,
                                    const std::string& name) {

@@ -1,7 +1,6 @@
 #include "HomePlatform/Objects/HomeObject.h"
 
 #include <algorithm>
-#include <cstring>
 #include <utility>
 
 #include "HomePlatform/Objects/AccessoryObject.h"

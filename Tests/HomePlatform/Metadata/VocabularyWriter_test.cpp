@@ -4,10 +4,14 @@
 #include <gtest/gtest.h>
 
 #include <sstream>
+#include <string_view>
 
 #include "HomePlatform/Metadata/VocabularyReader.h"
 
 namespace nidus {
+
+extern const std::string_view kVocabularyDocument;
+
 namespace {
 
 std::string textOf(const Vocabulary& vocabulary) {
@@ -22,6 +26,12 @@ TEST(VocabularyWriterTest, WritesWhatReadsBackTheSame) {
   ASSERT_TRUE(again);
   EXPECT_EQ(again->characteristics.size(), builtInVocabulary().characteristics.size());
   EXPECT_EQ(textOf(*again), text);
+}
+
+TEST(BuiltInVocabularyTest, HasWhatItsDocumentSays) {
+  const auto read = mergeVocabulary({}, kVocabularyDocument, "vocabulary.json");
+  ASSERT_TRUE(read) << read.failure().message;
+  EXPECT_EQ(textOf(builtInVocabulary()), textOf(*read));
 }
 
 TEST(VocabularyWriterTest, WritesAllOfAnEntry) {
