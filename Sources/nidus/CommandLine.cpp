@@ -5,12 +5,14 @@
 #include <csignal>
 #include <memory>
 #include <new>
+#include <optional>
 #include <utility>
 #include <vector>
 
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/UnusedSyntax.h"
 #include "nidus/UsageErrors.h"
 #include "nidus/Workspace.h"
 
@@ -36,21 +38,26 @@ std::string refuseEmpty(const std::string& value) {
   return value.empty() ? "the value is empty" : "";
 }
 
+/// The commands that are declared to the parser, by name; empty declares all.
+using DeclaredNames = std::vector<std::string>;
+
 /// Declares a command to the parser of arguments.
 class ParserSyntax final : public CommandSyntax {
  public:
   /// `chosen` takes what runs the command that was given.
-  ParserSyntax(CLI::App& app, std::function<ExitStatus()>& chosen) : app_(app), chosen_(chosen) {
+  ParserSyntax(CLI::App& app, const DeclaredNames& declared, std::function<ExitStatus()>& chosen)
+      : app_(app), declared_(declared), chosen_(chosen) {
     app_.set_help_flag("-h,--help", "Print this help and exit");
   }
 
   CommandSyntax& command(const std::string& name, const std::string& help,
                          const std::string& details) override {
+    app_.require_subcommand(1);
+    if (!isDeclared(name)) return unused_;
     CLI::App* below = app_.add_subcommand(name, help);
     below->fallthrough();
     below->footer(details + (details.empty() ? "" : "\n\n") + kOptionsOfAll);
-    app_.require_subcommand(1);
-    below_.push_back(std::make_unique<ParserSyntax>(*below, chosen_));
+    below_.push_back(std::make_unique<ParserSyntax>(*below, declared_, chosen_));
     return *below_.back();
   }
   void flag(const std::string& name, bool& target, const std::string& help) override {
@@ -90,8 +97,15 @@ class ParserSyntax final : public CommandSyntax {
   }
 
  private:
+  [[nodiscard]] bool isDeclared(const std::string& name) const {
+    return declared_.empty() ||
+           std::find(declared_.begin(), declared_.end(), name) != declared_.end();
+  }
+
   CLI::App& app_;
+  const DeclaredNames& declared_;
   std::function<ExitStatus()>& chosen_;
+  UnusedSyntax unused_;
   std::vector<std::unique_ptr<ParserSyntax>> below_;
 };
 
@@ -134,39 +148,74 @@ ExitStatus reportUsage(const UsageError& error, CommandPlace place) {
   return report({Failure::Kind::badInput, error.reason + "; " + remedy});
 }
 
-ExitStatus parseAndRun(CLI::App& app, std::vector<std::string> words,
-                       const std::function<ExitStatus()>& chosen, CommandPlace place) {
-  try {
+/// The words of one command with the parser that takes them.
+class CommandParser {
+ public:
+  CommandParser(const std::function<void(CommandSyntax&)>& declare, DeclaredNames declared,
+                CommandPlace place)
+      : declared_(std::move(declared)), place_(place) {
+    app_.set_version_flag("--version", "nidus " NIDUS_VERSION);
+    app_.footer(place == CommandPlace::shell ? kShellHelp : kFirstHelp);
+    declare(program_.emplace(app_, declared_, chosen_));
+  }
+
+  /// Whether they are a command to be run.
+  [[nodiscard]] bool takes(std::vector<std::string> words) {
+    try {
+      parse(std::move(words));
+      return true;
+    } catch (const CLI::ParseError&) {
+      return false;
+    }
+  }
+  /// Runs the command that was taken.
+  ExitStatus run() const {
+    try {
+      return chosen_();
+    } catch (const std::bad_alloc&) {
+      return report({Failure::Kind::platform,
+                     "there is not enough memory for this; give the program more of it, or less to "
+                     "read"});
+    }
+  }
+
+  /// Runs the command that they are, or says why they are none or what was asked for instead.
+  ExitStatus runOrTell(std::vector<std::string> words) {
+    try {
+      parse(std::move(words));
+    } catch (const CLI::CallForHelp&) {
+      return printText(app_.help());
+    } catch (const CLI::CallForVersion& version) {
+      return printText(std::string(version.what()) + '\n');
+    } catch (const CLI::ParseError& error) {
+      return reportUsage(usageErrorOf(app_, error), place_);
+    }
+    return run();
+  }
+
+ private:
+  void parse(std::vector<std::string> words) {
     // The parser takes them from the end.
     std::reverse(words.begin(), words.end());
-    app.parse(std::move(words));
-  } catch (const CLI::CallForHelp&) {
-    return printText(app.help());
-  } catch (const CLI::CallForVersion& version) {
-    return printText(std::string(version.what()) + '\n');
-  } catch (const CLI::ParseError& error) {
-    return reportUsage(usageErrorOf(app, error), place);
+    app_.parse(std::move(words));
   }
-  try {
-    return chosen();
-  } catch (const std::bad_alloc&) {
-    return report({Failure::Kind::platform,
-                   "there is not enough memory for this; give the program more of it, or less to "
-                   "read"});
-  }
-}
+
+  CLI::App app_{"Lets an assistant's commands act on a home.", "nidus"};
+  const DeclaredNames declared_;
+  std::function<ExitStatus()> chosen_;
+  std::optional<ParserSyntax> program_;
+  const CommandPlace place_;
+};
 
 }  // namespace
 
+/// Declaring all commands costs more than running one, so first those alone are declared that the
+/// words name. Whatever is to be said of all of them, as by help and by most errors, needs all.
 ExitStatus runCommand(std::vector<std::string> words,
                       const std::function<void(CommandSyntax&)>& declare, CommandPlace place) {
-  CLI::App app("Lets an assistant's commands act on a home.", "nidus");
-  app.set_version_flag("--version", "nidus " NIDUS_VERSION);
-  app.footer(place == CommandPlace::shell ? kShellHelp : kFirstHelp);
-  std::function<ExitStatus()> chosen;
-  ParserSyntax program(app, chosen);
-  declare(program);
-  return parseAndRun(app, std::move(words), chosen, place);
+  CommandParser named(declare, words, place);
+  if (named.takes(words)) return named.run();
+  return CommandParser(declare, {}, place).runOrTell(std::move(words));
 }
 
 int runCommandLine(int argc, const char* const* argv) {
