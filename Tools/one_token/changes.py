@@ -33,6 +33,16 @@ PAIRS = [
     ("fahrenheitToCelsius", "celsiusToFahrenheit"), ("outcomeOfRead", "outcomeOfWrite"),
 ]
 
+# Functions that take their two arguments in either order.
+SYMMETRIC = {"isEqual", "isEqualButDiacritics", "isEqualIgnoringDiacritics", "holdSameValue",
+             "min", "max"}
+
+# A statement that sets one thing, and one that makes a variable without a value.
+SETTING = re.compile(r"(?:(?:\w+(?:\.|->))*(?P<field>\w+) \+?= .*"
+                     r"|(?:\w+(?:\.|->))*set(?P<property>(?!If|Unless)[A-Z]\w*)\(.*\)"
+                     r"|(?P<swapped>\w+)\.swap\((?P<other>\w+)\));", re.DOTALL)
+MAKING = re.compile(r"(?!const|return)[\w:<>]+ (?P<variable>\w+);")
+
 
 @dataclasses.dataclass(frozen=True)
 class Change:
@@ -56,12 +66,33 @@ class Change:
         before, after = one_line(self.before), one_line(self.alternatives[0])
         return f"{self.file}: {self.source_line}: {self.kind}: `{before}` -> `{after}`"
 
+    def is_dropped_return(self):
+        return self.kind == "dropped statement" and self.before.startswith("return ")
+
     def applied(self, text, alternative):
         return text[:self.start] + alternative + text[self.start + len(self.before):]
 
 
 def one_line(text):
     return re.sub(r"\s+", " ", text)
+
+
+def is_order_free(first, second):
+    """Says whether the order of two statements means nothing: they set different things, neither of
+    which the other mentions, or one makes a variable that the other does without."""
+    makings = [(MAKING.fullmatch(first), second), (MAKING.fullmatch(second), first)]
+    if any(making and not mentions(other, making) for making, other in makings):
+        return True
+    settings = [(SETTING.fullmatch(first), second), (SETTING.fullmatch(second), first)]
+    return all(setting and not mentions(other, setting) for setting, other in settings)
+
+
+def mentions(statement, setting):
+    """Says whether a statement names what another one sets, as a field or by its setter."""
+    names = [name for name in setting.groups() if name]
+    names += [variant for name in names
+              for variant in ("set" + name, name[0].lower() + name[1:])]
+    return not set(names).isdisjoint(re.findall(r"\w+", statement))
 
 
 def constants_by_name(texts):
@@ -186,8 +217,9 @@ class Finder:
         if (source[former - 1] in {"else", "do"} or self._follows_control(former)
                 or self._is_needed(former, start - 1)):
             return
-        self._add("order", former, i, source.between(start, i) + " " +
-                  source.between(former, start - 1))
+        first, second = source.between(former, start - 1), source.between(start, i)
+        if not is_order_free(first, second):
+            self._add("order", former, i, f"{second} {first}")
 
     def _is_needed(self, first, last):
         """Says whether nothing compiles without a statement: one that makes a variable from a
@@ -214,12 +246,22 @@ class Finder:
         is_list = text == "{" or (text == "(" and self._is_call(i))
         if not is_list or not source.is_in_body(i):
             return
+        if self._called(i) in SYMMETRIC:
+            return
         items = source.items(i)
         for (first, last), (next_first, next_last) in zip(items, items[1:]):
-            if self._shape(first) != self._shape(next_first):
-                continue
-            self._add("order", first, next_last, source.between(next_first, next_last) + ", " +
-                      source.between(first, last))
+            former, latter = source.between(first, last), source.between(next_first, next_last)
+            if self._shape(first) == self._shape(next_first) and former != latter:
+                self._add("order", first, next_last, f"{latter}, {former}")
+
+    def _called(self, i):
+        """The name of the function that a bracket calls, its template arguments aside."""
+        name = i - 1
+        if self.source[name] == ">":
+            while self.source[name] != "<":
+                name -= 1
+            name -= 1
+        return self.source[name]
 
     def _shape(self, first):
         """What kind of argument begins with a token; those of two kinds do not fit in each other's

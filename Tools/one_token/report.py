@@ -1,6 +1,7 @@
 """The report of the changes that were tried, and the list of those that are known to go unnoticed.
 """
 
+import collections
 import re
 import threading
 
@@ -55,19 +56,24 @@ def parsed(line):
     return name, verdicts.get(words, words.removeprefix("noticed by "))
 
 
-def read_reasons(path):
+class Reasons:
     """Why changes go unnoticed, by their known names: each paragraph holds names and, indented, the
-    reason that they share."""
-    reasons, names = {}, []
-    for line in path.read_text(encoding="utf-8").splitlines():
-        if line.startswith("#"):
-            continue
-        if not line.strip():
-            names = []
-        elif line[0].isspace():
-            for name in names:
-                reasons[name] = (reasons[name] + " " + line.strip()).strip()
-        else:
-            names.append(line)
-            reasons[line] = ""
-    return reasons
+    reason that they share. Changes of one name stand there as often as they go unnoticed."""
+
+    def __init__(self, path):
+        self.names = []
+        for paragraph in re.split(r"\n(?:\s*\n)+", path.read_text(encoding="utf-8")):
+            lines = [line for line in paragraph.splitlines() if not line.startswith("#")]
+            if any(line.startswith(" ") for line in lines):
+                self.names += [line for line in lines if not line.startswith(" ")]
+        self.left = collections.Counter(self.names)
+
+    def take(self, name):
+        """Says whether there is a reason that no other change of the name has taken."""
+        self.left[name] -= 1
+        return self.left[name] >= 0
+
+    def without_change(self, changes):
+        """The names that stand there more often than among all changes."""
+        return list((collections.Counter(self.names) -
+                     collections.Counter(change.known_name() for change in changes)).elements())

@@ -108,6 +108,8 @@ class Source:
 
     def _opens_body(self, index):
         """Tells a function's, lambda's or statement's brace from a scope's and an initialiser's."""
+        if self[index - 1] == ")" and self[self.partner[index - 1] - 1] == "requires":
+            return False
         if self[index - 1] in {")", "]", "else", "do", "try", "const", "noexcept", "override"}:
             return True
         for i in range(index - 1, max(index - 12, -1), -1):  # A return type behind an arrow.
