@@ -169,7 +169,7 @@ class CommandParser {
     }
   }
   /// Runs the command that was taken.
-  ExitStatus run() const {
+  [[nodiscard]] ExitStatus run() const {
     try {
       return chosen_();
     } catch (const std::bad_alloc&) {
