@@ -1,8 +1,8 @@
 #pragma once
 
 #include <unordered_map>
-#include <vector>
 
+#include "Assistant/TextList.h"
 #include "PlatformModel/Home/NDHome.h"
 #include "PlatformModel/System/NDString.h"
 
@@ -18,13 +18,15 @@ class HomeMemberships {
 
   /// The names of the groups that hold `service`, in the order of the home's groups, once per time
   /// that a group lists it; may be empty.
-  [[nodiscard]] std::vector<NDString> groupNames(const NDService& service) const;
+  [[nodiscard]] TextList groupNames(const NDService& service) const;
 
   /// The name of the last of the home's zones that contains `room`; null when none does.
   [[nodiscard]] NDString zoneName(const NDRoom& room) const;
 
  private:
-  std::unordered_map<const NDService*, std::vector<NDString>> groupNames_;
+  void nameGroups(const NDHome& home);
+
+  std::unordered_map<const NDService*, TextList> groupNames_;
   std::unordered_map<const NDRoom*, NDString> zoneNames_;
 };
 

@@ -5,15 +5,14 @@
 namespace nidus {
 namespace {
 
-NDDictionaryValue listValue(const std::vector<NDString>& texts) {
+NDDictionaryValue listValue(const TextList& texts) {
   NDDictionaryList list;
   list.reserve(texts.size());
   for (const NDString& text : texts) list.emplace_back(text);
   return NDDictionaryValue(std::move(list));
 }
 
-void setUnlessEmpty(NDDictionary& dictionary, std::string_view key,
-                    const std::vector<NDString>& texts) {
+void setUnlessEmpty(NDDictionary& dictionary, std::string_view key, const TextList& texts) {
   if (!texts.empty()) dictionary.set(key, listValue(texts));
 }
 
@@ -24,11 +23,11 @@ class FieldWriter {
     if (text) appendOnOneLine(begin(key), text.view());
   }
 
-  void field(std::string_view key, const std::vector<NDString>& texts) {
+  void field(std::string_view key, const TextList& texts) {
     if (texts.empty()) return;
     begin(key) += '[';
     for (const NDString& text : texts) {
-      if (&text != &texts.front()) out_ += ", ";
+      if (&text != texts.begin()) out_ += ", ";
       appendOnOneLine(out_, text.view());
     }
     out_ += ']';

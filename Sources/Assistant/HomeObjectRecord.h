@@ -4,6 +4,7 @@
 #include <string_view>
 #include <vector>
 
+#include "Assistant/TextList.h"
 #include "PlatformModel/System/NDDictionary.h"
 #include "PlatformModel/System/NDString.h"
 #include "PlatformModel/System/NDURL.h"
@@ -25,16 +26,16 @@ inline constexpr std::string_view kObjectCharacteristicsKey = "objectCharacteris
 /// One object of the home, flattened: a map with a fixed set of keys. A field that is null, or an
 /// empty list, is a key that is absent. A plain value; nobody changes a record of a snapshot.
 struct HomeObjectRecord {
-  NDString objectType;                          ///< Entity type; always there.
-  NDString objectName;                          ///< Absent for a service without a name.
-  NDURLRef objectIdentifier;                    ///< Always there.
-  NDString objectHome;                          ///< Absent for a home alone.
-  NDString objectRoom;                          ///< Services alone.
-  NDString objectZone;                          ///< Rooms alone.
-  std::vector<NDString> objectGroups;           ///< Services alone; absent when empty.
-  NDString objectServiceType;                   ///< Services alone.
-  NDString objectAssociatedServiceType;         ///< Services alone.
-  std::vector<NDString> objectCharacteristics;  ///< Services alone; never empty there.
+  NDString objectType;                   ///< Entity type; always there.
+  NDString objectName;                   ///< Absent for a service without a name.
+  NDURLRef objectIdentifier;             ///< Always there.
+  NDString objectHome;                   ///< Absent for a home alone.
+  NDString objectRoom;                   ///< Services alone.
+  NDString objectZone;                   ///< Rooms alone.
+  TextList objectGroups;                 ///< Services alone; absent when empty.
+  NDString objectServiceType;            ///< Services alone.
+  NDString objectAssociatedServiceType;  ///< Services alone.
+  TextList objectCharacteristics;        ///< Services alone; never empty there.
 
   /// The record read by key, in the order above; absent keys are left out.
   [[nodiscard]] NDDictionary dictionary() const;

@@ -28,7 +28,7 @@ bool contains(const NDURLRef& field, const NDString& part) {
   return field && part && containsIgnoringCase(field->text().view(), part.view());
 }
 
-bool contains(const std::vector<NDString>& field, const NDString& text) {
+bool contains(const TextList& field, const NDString& text) {
   return text && std::find(field.begin(), field.end(), text) != field.end();
 }
 

@@ -2,6 +2,7 @@
 
 #include <utility>
 
+#include "Assistant/AddressableTypes.h"
 #include "Assistant/HomeMemberships.h"
 #include "Assistant/ObjectURL.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
@@ -44,19 +45,6 @@ std::shared_ptr<NDHome> primaryHome(const std::shared_ptr<NDHomeManager>& manage
   return nullptr;
 }
 
-/// The types of the characteristics that the assistant can address.
-std::vector<NDString> addressableTypes(const NDService& service, const NDNAPMetadata* metadata) {
-  std::vector<NDString> types;
-  if (!metadata) return types;
-  types.reserve(service.characteristics().size());
-  for (const auto& characteristic : service.characteristics()) {
-    const NDString& type = characteristic->characteristicType();
-    const NDString name = metadata->mapToAssistantCharacteristicName(type);
-    if (name && name != "IDENTIFY") types.push_back(type);
-  }
-  return types;
-}
-
 std::size_t greatestRecordCount(const NDHome& home) {
   std::size_t count = 1 + home.serviceGroups().size() + home.rooms().size() + home.zones().size() +
                       home.actionSets().size() + home.triggers().size();
@@ -64,11 +52,19 @@ std::size_t greatestRecordCount(const NDHome& home) {
   return count;
 }
 
+/// Where the services of one accessory are.
+struct Place {
+  std::shared_ptr<NDAccessory> accessory;
+  std::shared_ptr<NDHome> home;
+  NDString homeName;
+  NDString roomName;
+};
+
 /// Appends the records of one home's objects. What is the same for all of them is read once.
 class HomeFlattener {
  public:
   HomeFlattener(HomeObjectRecords& list, const NDHome* home, const NDNAPMetadata* metadata)
-      : list_(list), memberships_(home), metadata_(metadata) {}
+      : list_(list), memberships_(home), types_(metadata) {}
 
   void append(NDString name, NDString type, NDString home, NDURLRef identifier) {
     HomeObjectRecord& record = list_.emplace_back();
@@ -90,20 +86,17 @@ class HomeFlattener {
   }
 
   void appendService(const NDService& service) {
-    std::vector<NDString> types = addressableTypes(service, metadata_);
+    TextList types = types_.of(service);
     if (types.empty()) return;
-    const auto accessory = service.accessory();
-    const auto home = property(accessory, &NDAccessory::home);
-    const NDString& homeName = property(home, &NDHome::name);
-    append(service.name(), entityTypes().service, homeName, url(service));
+    const Place& place = placeOf(service);
+    append(service.name(), entityTypes().service, place.homeName,
+           url(service, place.accessory.get(), place.home.get()));
     HomeObjectRecord& record = list_.back();
     record.objectServiceType = service.serviceType();
     record.objectCharacteristics = std::move(types);
     record.objectAssociatedServiceType = service.associatedServiceType();
     record.objectGroups = memberships_.groupNames(service);
-    const auto room = property(accessory, &NDAccessory::room);
-    const NDString& roomName = property(room, &NDRoom::name);
-    if (roomName != homeName) record.objectRoom = roomName;
+    if (place.roomName != place.homeName) record.objectRoom = place.roomName;
   }
 
   void appendHome(const NDHome& home) {
@@ -121,9 +114,22 @@ class HomeFlattener {
   }
 
  private:
+  /// Services of one accessory mostly follow each other.
+  const Place& placeOf(const NDService& service) {
+    auto accessory = service.accessory();
+    if (accessory == place_.accessory) return place_;
+    const auto room = property(accessory, &NDAccessory::room);
+    place_.home = property(accessory, &NDAccessory::home);
+    place_.homeName = property(place_.home, &NDHome::name);
+    place_.roomName = property(room, &NDRoom::name);
+    place_.accessory = std::move(accessory);
+    return place_;
+  }
+
   HomeObjectRecords& list_;
   const HomeMemberships memberships_;
-  const NDNAPMetadata* const metadata_;
+  AddressableTypes types_;
+  Place place_;
 };
 
 }  // namespace

@@ -15,6 +15,9 @@ inline constexpr std::string_view kIdentifierHost = "local";
 /// Each call gives a new object, never null. May be called from any thread.
 [[nodiscard]] NDURLRef url(const NDHome& home);
 [[nodiscard]] NDURLRef url(const NDService& service);
+/// The same for a service whose accessory and home have been asked for; either may be null.
+[[nodiscard]] NDURLRef url(const NDService& service, const NDAccessory* accessory,
+                           const NDHome* home);
 [[nodiscard]] NDURLRef url(const NDRoom& room);
 [[nodiscard]] NDURLRef url(const NDZone& zone);
 [[nodiscard]] NDURLRef url(const NDServiceGroup& group);
