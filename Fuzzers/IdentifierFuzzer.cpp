@@ -49,15 +49,14 @@ struct Parts {
   friend bool operator==(const Parts&, const Parts&) = default;
 };
 
-Parts split(const NDURLRef& url) {
+Parts split(const NDURL& url) {
   Parts parts;
   splitIdentifier(url, parts.kind, parts.id, parts.home, parts.accessory);
   return parts;
 }
 
-void expectParts(const NDURLRef& url, const Parts& expected) {
-  if (!(split(url) == expected))
-    reportFinding("A URL does not say its parts: " + url->text().str());
+void expectParts(const NDURL& url, const Parts& expected) {
+  if (!(split(url) == expected)) reportFinding("A URL does not say its parts: " + url.text().str());
 }
 
 /// The URL of an object in a home says the home, and the object by its UUID.
@@ -71,13 +70,13 @@ void checkObject(const char* kind, const Object& object) {
 }
 
 void checkService(const NDHome& home, const std::shared_ptr<NDService>& service) {
-  const NDURLRef address = url(*service);
+  const NDURL address = url(*service);
   const Parts parts = split(address);
   expectParts(address, {"service", std::to_string(service->instanceID()), home.uuid().UUIDString(),
                         service->accessory()->uuid().UUIDString()});
   const auto accessory =
       findInArrayByUUID(home.accessories(), NDUUID::fromText(parts.accessory.view()));
-  if (!accessory) reportFinding("A service's accessory is not found: " + address->text().str());
+  if (!accessory) reportFinding("A service's accessory is not found: " + address.text().str());
 }
 
 void checkHome(const HomeData& data) {
@@ -104,7 +103,7 @@ std::string takeText(FuzzedDataProvider& input, const HomeData& data) {
   return text;
 }
 
-void checkAnyURL(const NDURLRef& any) {
+void checkAnyURL(const NDURL& any) {
   const NDString scheme = any->scheme();
   if (scheme && !any->text().view().starts_with(scheme.str() + ':')) {
     reportFinding("A URL does not begin with its scheme: " + any->text().str());

@@ -31,7 +31,7 @@ NDDictionary filterForm(const VAHAFilter& filter) {
     form.set("search", NDDictionaryValue(searchForm(*search)));
   } else if (const auto* named = dynamic_cast<const VAHAIdentifierFilter*>(&filter)) {
     NDDictionaryList identifiers;
-    for (const NDURLRef& each : named->identifiers()) identifiers.emplace_back(each->text());
+    for (const NDURL& each : named->identifiers()) identifiers.emplace_back(each.text());
     form.set("identifiers", NDDictionaryValue(std::move(identifiers)));
   }
   return form;

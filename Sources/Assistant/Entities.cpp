@@ -16,7 +16,7 @@ namespace {
 /// The service type of a service that the assistant has no name for.
 constexpr std::string_view kCustomServiceType = "CUSTOM";
 
-NDURLRef freshIdentifier() {
+NDURL freshIdentifier() {
   std::array<char, 1 + NDUUID::kTextLength> path;
   path[0] = '/';
   NDUUID::random().writeText(path.data() + 1);

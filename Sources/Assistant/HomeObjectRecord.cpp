@@ -54,7 +54,7 @@ NDDictionary HomeObjectRecord::dictionary() const {
   dictionary.setIfPresent(kObjectTypeKey, objectType);
   dictionary.setIfPresent(kObjectNameKey, objectName);
   if (objectIdentifier) {
-    dictionary.set(kObjectIdentifierKey, NDDictionaryValue(objectIdentifier->text()));
+    dictionary.set(kObjectIdentifierKey, NDDictionaryValue(objectIdentifier.text()));
   }
   dictionary.setIfPresent(kObjectHomeKey, objectHome);
   dictionary.setIfPresent(kObjectRoomKey, objectRoom);
@@ -71,7 +71,7 @@ std::string description(const HomeObjectRecord& record) {
   writer.field(kObjectTypeKey, record.objectType);
   writer.field(kObjectNameKey, record.objectName);
   if (record.objectIdentifier) {
-    writer.field(kObjectIdentifierKey, record.objectIdentifier->text());
+    writer.field(kObjectIdentifierKey, record.objectIdentifier.text());
   }
   writer.field(kObjectHomeKey, record.objectHome);
   writer.field(kObjectRoomKey, record.objectRoom);

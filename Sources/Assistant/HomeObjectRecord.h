@@ -28,7 +28,7 @@ inline constexpr std::string_view kObjectCharacteristicsKey = "objectCharacteris
 struct HomeObjectRecord {
   NDString objectType;                   ///< Entity type; always there.
   NDString objectName;                   ///< Absent for a service without a name.
-  NDURLRef objectIdentifier;             ///< Always there.
+  NDURL objectIdentifier;                ///< Always there.
   NDString objectHome;                   ///< Absent for a home alone.
   NDString objectRoom;                   ///< Services alone.
   NDString objectZone;                   ///< Rooms alone.

@@ -58,9 +58,9 @@ const VAHASearchCriteriaFilter* asSearchFilter(const VAHAFilter* filter) {
   return dynamic_cast<const VAHASearchCriteriaFilter*>(filter);
 }
 
-std::vector<NDURLRef> identifiersOf(const VAHAFilter* filter) {
+std::vector<NDURL> identifiersOf(const VAHAFilter* filter) {
   const auto* identifierFilter = dynamic_cast<const VAHAIdentifierFilter*>(filter);
-  return identifierFilter ? identifierFilter->identifiers() : std::vector<NDURLRef>();
+  return identifierFilter ? identifierFilter->identifiers() : std::vector<NDURL>();
 }
 
 void logAction(const VAHAAction& action) {

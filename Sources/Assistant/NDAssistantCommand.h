@@ -110,8 +110,7 @@ class NDAssistantCommand : public VAHACommand,
                                                                        const NDString& type) const;
   /// Gives the empty list, whatever the identifiers: hosts rely on commands that name their
   /// objects by identifiers finding no match.
-  [[nodiscard]] ObjectList objectsWithIdentifierList(
-      const std::vector<NDURLRef>& identifiers) const;
+  [[nodiscard]] ObjectList objectsWithIdentifierList(const std::vector<NDURL>& identifiers) const;
 
   // Reading.
 

@@ -24,8 +24,8 @@ bool isEqualButDiacritics(const NDString& field, const NDString& text) {
   return field && text && isEqualIgnoringDiacritics(field.view(), text.view());
 }
 
-bool contains(const NDURLRef& field, const NDString& part) {
-  return field && part && containsIgnoringCase(field->text().view(), part.view());
+bool contains(const NDURL& field, const NDString& part) {
+  return field && part && containsIgnoringCase(field.text().view(), part.view());
 }
 
 bool contains(const TextList& field, const NDString& text) {
@@ -301,7 +301,7 @@ NDAssistantCommand::CharacteristicList NDAssistantCommand::filterObjects_forchar
 }
 
 ObjectList NDAssistantCommand::objectsWithIdentifierList(
-    const std::vector<NDURLRef>& /*identifiers*/) const {
+    const std::vector<NDURL>& /*identifiers*/) const {
   // The search starts from no list instead of the snapshot, so nothing is ever found. Hosts have
   // come to rely on that reply; it is not to be repaired here.
   return {};

@@ -66,7 +66,7 @@ class HomeFlattener {
   HomeFlattener(HomeObjectRecords& list, const NDHome* home, const NDNAPMetadata* metadata)
       : list_(list), memberships_(home), types_(metadata) {}
 
-  void append(NDString name, NDString type, NDString home, NDURLRef identifier) {
+  void append(NDString name, NDString type, NDString home, NDURL identifier) {
     HomeObjectRecord& record = list_.emplace_back();
     record.objectType = std::move(type);
     record.objectName = std::move(name);
@@ -215,7 +215,7 @@ void NDAssistantGather::addToList_objectWithName_type_home_andIdentifer(HomeObje
                                                                         const NDString& name,
                                                                         const NDString& type,
                                                                         const NDString& home,
-                                                                        NDURLRef identifier) const {
+                                                                        NDURL identifier) const {
   HomeFlattener(list, nullptr, nullptr).append(name, type, home, std::move(identifier));
 }
 

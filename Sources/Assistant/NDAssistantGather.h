@@ -60,7 +60,7 @@ class NDAssistantGather final : public NDHomeManagerDelegate {
   void addToList_objectWithName_type_home_andIdentifer(HomeObjectRecords& list,
                                                        const NDString& name, const NDString& type,
                                                        const NDString& home,
-                                                       NDURLRef identifier) const;
+                                                       NDURL identifier) const;
   void addToList_room(HomeObjectRecords& list, const NDRoom& room) const;
   void addToList_service(HomeObjectRecords& list, const std::shared_ptr<NDService>& service) const;
 

@@ -76,13 +76,13 @@ NDArray<NDHome> homesOf(const std::shared_ptr<NDAssistantGather>& gather) {
 
 }  // namespace
 
-void splitIdentifier(const NDURLRef& identifier, NDString& kind, NDString& objectID, NDString& home,
+void splitIdentifier(const NDURL& identifier, NDString& kind, NDString& objectID, NDString& home,
                      NDString& accessory) {
-  if (identifier->scheme() != kIdentifierScheme) {
+  if (identifier.scheme() != kIdentifierScheme) {
     // A foreign scheme clears the outputs and is read all the same.
     objectID = kind = home = accessory = nullptr;
   }
-  readParts(*identifier, kind, objectID, home, accessory);
+  readParts(identifier, kind, objectID, home, accessory);
 }
 
 ServiceLookUp::ServiceLookUp(std::shared_ptr<NDAssistantGather> gather)
@@ -90,7 +90,7 @@ ServiceLookUp::ServiceLookUp(std::shared_ptr<NDAssistantGather> gather)
 
 std::shared_ptr<NDService> ServiceLookUp::service(const HomeObjectRecord& record) {
   if (!record.objectIdentifier) return nullptr;
-  const Identifier identifier(*record.objectIdentifier);
+  const Identifier identifier(record.objectIdentifier);
   const auto home = homes_.find(homesOf(gather_), NDUUID::fromText(identifier.home));
   if (!home) return nullptr;
   const auto accessory =
@@ -107,7 +107,7 @@ std::shared_ptr<NDService> serviceFromObject(const HomeObjectRecord& record,
 std::shared_ptr<NDActionSet> actionSetFromObject(const HomeObjectRecord& record,
                                                  const std::shared_ptr<NDAssistantGather>& gather) {
   if (!record.objectIdentifier) return nullptr;
-  const Identifier identifier(*record.objectIdentifier);
+  const Identifier identifier(record.objectIdentifier);
   const auto home = findInArrayByUUID(homesOf(gather), NDUUID::fromText(identifier.home));
   return findInArrayByUUID(property(home, &NDHome::actionSets), NDUUID::fromText(identifier.id));
 }

@@ -15,7 +15,7 @@ namespace nidus {
 /// all four to null beforehand. `identifier` may not be null.
 /// Throws `std::out_of_range` for a path of fewer than two components, and for a query that ends
 /// with a key that has no value; only identifiers that the plug-in made are ever split.
-void splitIdentifier(const NDURLRef& identifier, NDString& kind, NDString& objectID, NDString& home,
+void splitIdentifier(const NDURL& identifier, NDString& kind, NDString& objectID, NDString& home,
                      NDString& accessory);
 
 /// Finds the live service, or action set, of a record among the homes that the gatherer's manager

@@ -41,7 +41,7 @@ class URLText {
     return object ? uuid(object->uuid()) : text("(null)");
   }
 
-  [[nodiscard]] NDURLRef makeURL() const {
+  [[nodiscard]] NDURL makeURL() const {
     const auto length = static_cast<std::size_t>(end_ - characters_.data());
     return NDURL::fromText(std::string_view(characters_.data(), length));
   }
@@ -52,22 +52,22 @@ class URLText {
 };
 
 template <class Object>
-NDURLRef urlInHome(std::string_view path, const Object& object) {
+NDURL urlInHome(std::string_view path, const Object& object) {
   const std::shared_ptr<NDHome> home = object.home();
   return URLText(path).uuid(object.uuid()).text("&home=").uuidOf(home.get()).makeURL();
 }
 
 }  // namespace
 
-NDURLRef url(const NDHome& home) { return URLText("/home?id=").uuid(home.uuid()).makeURL(); }
+NDURL url(const NDHome& home) { return URLText("/home?id=").uuid(home.uuid()).makeURL(); }
 
-NDURLRef url(const NDService& service) {
+NDURL url(const NDService& service) {
   const std::shared_ptr<NDAccessory> accessory = service.accessory();
   const std::shared_ptr<NDHome> home = property(accessory, &NDAccessory::home);
   return url(service, accessory.get(), home.get());
 }
 
-NDURLRef url(const NDService& service, const NDAccessory* accessory, const NDHome* home) {
+NDURL url(const NDService& service, const NDAccessory* accessory, const NDHome* home) {
   URLText text("/service?id=");
   text.number(service.instanceID());
   text.text("&accessory=").uuidOf(accessory);
@@ -75,14 +75,14 @@ NDURLRef url(const NDService& service, const NDAccessory* accessory, const NDHom
   return text.makeURL();
 }
 
-NDURLRef url(const NDRoom& room) { return urlInHome("/room?id=", room); }
+NDURL url(const NDRoom& room) { return urlInHome("/room?id=", room); }
 
-NDURLRef url(const NDZone& zone) { return urlInHome("/zone?id=", zone); }
+NDURL url(const NDZone& zone) { return urlInHome("/zone?id=", zone); }
 
-NDURLRef url(const NDServiceGroup& group) { return urlInHome("/group?id=", group); }
+NDURL url(const NDServiceGroup& group) { return urlInHome("/group?id=", group); }
 
-NDURLRef url(const NDActionSet& actionSet) { return urlInHome("/actionSet?id=", actionSet); }
+NDURL url(const NDActionSet& actionSet) { return urlInHome("/actionSet?id=", actionSet); }
 
-NDURLRef url(const NDTrigger& trigger) { return urlInHome("/trigger?id=", trigger); }
+NDURL url(const NDTrigger& trigger) { return urlInHome("/trigger?id=", trigger); }
 
 }  // namespace nidus

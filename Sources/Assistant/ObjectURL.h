@@ -13,15 +13,14 @@ inline constexpr std::string_view kIdentifierHost = "local";
 
 /// Builds the identifier URL of a platform object from its UUIDs (and a service's instance ID).
 /// Each call gives a new object, never null. May be called from any thread.
-[[nodiscard]] NDURLRef url(const NDHome& home);
-[[nodiscard]] NDURLRef url(const NDService& service);
+[[nodiscard]] NDURL url(const NDHome& home);
+[[nodiscard]] NDURL url(const NDService& service);
 /// The same for a service whose accessory and home have been asked for; either may be null.
-[[nodiscard]] NDURLRef url(const NDService& service, const NDAccessory* accessory,
-                           const NDHome* home);
-[[nodiscard]] NDURLRef url(const NDRoom& room);
-[[nodiscard]] NDURLRef url(const NDZone& zone);
-[[nodiscard]] NDURLRef url(const NDServiceGroup& group);
-[[nodiscard]] NDURLRef url(const NDActionSet& actionSet);
-[[nodiscard]] NDURLRef url(const NDTrigger& trigger);
+[[nodiscard]] NDURL url(const NDService& service, const NDAccessory* accessory, const NDHome* home);
+[[nodiscard]] NDURL url(const NDRoom& room);
+[[nodiscard]] NDURL url(const NDZone& zone);
+[[nodiscard]] NDURL url(const NDServiceGroup& group);
+[[nodiscard]] NDURL url(const NDActionSet& actionSet);
+[[nodiscard]] NDURL url(const NDTrigger& trigger);
 
 }  // namespace nidus

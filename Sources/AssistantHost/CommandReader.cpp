@@ -43,7 +43,7 @@ std::shared_ptr<const VAHAFilter> searchFromJson(const JsonPlaced& placed) {
 }
 
 std::shared_ptr<const VAHAFilter> identifiersFromJson(const JsonPlaced& placed) {
-  std::vector<NDURLRef> identifiers;
+  std::vector<NDURL> identifiers;
   for (const JsonPlaced& identifier : placed.array()) {
     identifiers.push_back(NDURL::fromText(identifier.text()));
   }

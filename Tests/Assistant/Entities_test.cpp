@@ -72,8 +72,8 @@ TEST_F(EntitiesTest, EmptyRecordLeavesFieldsUnset) {
 
 TEST_F(EntitiesTest, EachEntityHasAnIdentifierOfItsOwn) {
   const HomeObjectRecord record = serviceRecord("Kitchen");
-  const NDString first = entityFromObject(record)->identifier()->text();
-  EXPECT_NE(first, entityFromObject(record)->identifier()->text());
+  const NDString first = entityFromObject(record)->identifier().text();
+  EXPECT_NE(first, entityFromObject(record)->identifier().text());
   EXPECT_THAT(first.str(), MatchesRegex("x-corvane-nidus://local/[0-9A-F]{8}-[0-9A-F]{4}-"
                                         "[0-9A-F]{4}-[0-9A-F]{4}-[0-9A-F]{12}"));
   EXPECT_EQ(first.view().size(), 60U);  // with nothing behind a zero, which ends what is matched
@@ -116,7 +116,7 @@ TEST_F(EntitiesTest, ServiceIsInItsAccessorysRoom) {
 TEST_F(EntitiesTest, ServiceHasAFreshIdentifier) {
   const auto home = HomeBuilder("Cabin").light("Lamp").build();
   const auto identifier = [&home] {
-    return entityFromService(home->service("Lamp"), nullptr)->identifier()->text();
+    return entityFromService(home->service("Lamp"), nullptr)->identifier().text();
   };
   EXPECT_NE(identifier(), identifier());
 }
@@ -125,16 +125,16 @@ TEST_F(EntitiesTest, ActionSetHasNameAndType) {
   const auto home = HomeBuilder("Cabin").scene("Good night").build();
   const auto entity = entityFromActionSet(home->scene("Good night"));
   EXPECT_EQ(textOf(*entity), "Good night, SCENE, -, -, -, -");
-  EXPECT_NE(entity->identifier()->text(),
-            entityFromActionSet(home->scene("Good night"))->identifier()->text());
+  EXPECT_NE(entity->identifier().text(),
+            entityFromActionSet(home->scene("Good night"))->identifier().text());
 }
 
 TEST_F(EntitiesTest, TriggerHasNameAndType) {
   const auto home = HomeBuilder("Cabin").trigger("Sunset").build();
   const auto entity = entityFromTrigger(home->trigger("Sunset"));
   EXPECT_EQ(textOf(*entity), "Sunset, TRIGGER, -, -, -, -");
-  EXPECT_NE(entity->identifier()->text(),
-            entityFromTrigger(home->trigger("Sunset"))->identifier()->text());
+  EXPECT_NE(entity->identifier().text(),
+            entityFromTrigger(home->trigger("Sunset"))->identifier().text());
 }
 
 TEST_F(EntitiesTest, AbsentObjectsLeaveFieldsUnset) {

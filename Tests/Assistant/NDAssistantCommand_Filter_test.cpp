@@ -398,7 +398,7 @@ TEST_F(FilterTest, ByAttributeKeepsNothingForUnmapped) {
 
 TEST_F(FilterTest, IdentifiersFindNothing) {
   snapshot({homeRecord("Cottage"), serviceRecord("Lamp")});
-  std::vector<NDURLRef> identifiers;
+  std::vector<NDURL> identifiers;
   for (const auto& object : command_->nidusObjects()) {
     identifiers.push_back(object.objectIdentifier);
   }

@@ -244,14 +244,14 @@ TEST_F(NDAssistantGatherTest, HomesComeOneAfterTheOther) {
 TEST_F(NDAssistantGatherTest, HomeRecordHasThreeKeys) {
   const auto home = useHome(HomeBuilder("Cabin"));
   EXPECT_EQ(description(records()), "[{objectType: HOME, objectName: Cabin, objectIdentifier: " +
-                                        url(*home)->text().str() + "}]");
+                                        url(*home).text().str() + "}]");
 }
 
 TEST_F(NDAssistantGatherTest, GenericRecordsHaveFourKeys) {
   const auto home = useHome(HomeBuilder("Cabin").scene("Good night"));
   EXPECT_EQ(description(recordOf("Good night")),
             "{objectType: SCENE, objectName: Good night, objectIdentifier: " +
-                url(*home->scene("Good night"))->text().str() + ", objectHome: Cabin}");
+                url(*home->scene("Good night")).text().str() + ", objectHome: Cabin}");
 }
 
 TEST_F(NDAssistantGatherTest, RoomIsInItsLastZone) {
@@ -277,7 +277,7 @@ TEST_F(NDAssistantGatherTest, ServiceRecordHasAllKeys) {
                                 .group("Evening", {"Lamp"}));
   EXPECT_EQ(description(recordOf("Lamp")),
             "{objectType: SERVICE, objectName: Lamp, objectIdentifier: " +
-                url(*home->service("Lamp"))->text().str() +
+                url(*home->service("Lamp")).text().str() +
                 ", objectHome: Cabin, objectRoom: Kitchen, objectGroups: [Night, Evening], "
                 "objectServiceType: com.corvane.nidus.service.light, "
                 "objectAssociatedServiceType: com.corvane.nidus.service.outlet, "

@@ -103,7 +103,7 @@ class ObjectLookUpTest : public PlatformTest {
     platform().runUntilIdle();
   }
 
-  static HomeObjectRecord recordWith(NDURLRef identifier) {
+  static HomeObjectRecord recordWith(NDURL identifier) {
     HomeObjectRecord record;
     record.objectIdentifier = std::move(identifier);
     return record;

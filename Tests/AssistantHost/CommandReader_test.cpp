@@ -63,8 +63,8 @@ TEST(CommandReaderTest, ReadsIdentifiersAsTheyStand) {
   EXPECT_EQ(command->filter()->encodedClassName(), VAHAIdentifierFilterClassIdentifier);
   const auto& filter = dynamic_cast<const VAHAIdentifierFilter&>(*command->filter());
   ASSERT_EQ(filter.identifiers().size(), 3U);
-  EXPECT_EQ(filter.identifiers()[0]->text(), "x-corvane-nidus://a");
-  EXPECT_EQ(filter.identifiers()[2]->text(), "b");
+  EXPECT_EQ(filter.identifiers()[0].text(), "x-corvane-nidus://a");
+  EXPECT_EQ(filter.identifiers()[2].text(), "b");
 }
 
 TEST(CommandReaderTest, KeepsTheOrderOfActions) {

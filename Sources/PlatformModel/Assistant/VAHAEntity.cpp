@@ -7,7 +7,7 @@ std::shared_ptr<VAHAEntity> VAHAEntity::entity() { return std::make_shared<VAHAE
 NDDictionary VAHAEntity::dictionary() const {
   NDDictionary form;
   form.setIfPresent("name", name_);
-  if (identifier_) form.setIfPresent("identifier", identifier_->text());
+  if (identifier_) form.setIfPresent("identifier", identifier_.text());
   form.setIfPresent("entityType", entityType_);
   form.setIfPresent("serviceType", serviceType_);
   form.setIfPresent("room", room_);

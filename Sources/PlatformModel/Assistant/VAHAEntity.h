@@ -19,8 +19,8 @@ class ND_EXPORT VAHAEntity {
 
   [[nodiscard]] const NDString& name() const noexcept { return name_; }
   void setName(NDString name) { name_ = std::move(name); }
-  [[nodiscard]] const NDURLRef& identifier() const noexcept { return identifier_; }
-  void setIdentifier(NDURLRef identifier) { identifier_ = std::move(identifier); }
+  [[nodiscard]] const NDURL& identifier() const noexcept { return identifier_; }
+  void setIdentifier(NDURL identifier) { identifier_ = std::move(identifier); }
   [[nodiscard]] const NDString& entityType() const noexcept { return entityType_; }
   void setEntityType(NDString type) { entityType_ = std::move(type); }
   [[nodiscard]] const NDString& serviceType() const noexcept { return serviceType_; }
@@ -37,7 +37,7 @@ class ND_EXPORT VAHAEntity {
 
  private:
   NDString name_;
-  NDURLRef identifier_;
+  NDURL identifier_;
   NDString entityType_;
   NDString serviceType_;
   NDString room_;

@@ -18,9 +18,9 @@ class FilterText {
     addQuoted(value.view());
   }
 
-  void add(const NDURLRef& identifier) {
+  void add(const NDURL& identifier) {
     separate();
-    addQuoted(identifier->text().view());
+    addQuoted(identifier.text().view());
   }
 
   [[nodiscard]] std::string finish() { return std::move(text_) + '}'; }
@@ -67,7 +67,7 @@ std::string_view VAHAIdentifierFilter::encodedClassName() const {
 
 std::string VAHAIdentifierFilter::description() const {
   FilterText text(encodedClassName());
-  for (const NDURLRef& identifier : identifiers_) text.add(identifier);
+  for (const NDURL& identifier : identifiers_) text.add(identifier);
   return text.finish();
 }
 

@@ -76,11 +76,11 @@ class ND_EXPORT VAHAIdentifierFilter : public VAHAFilter {
   [[nodiscard]] std::string description() const override;
 
   /// None of the identifiers is null.
-  [[nodiscard]] const std::vector<NDURLRef>& identifiers() const noexcept { return identifiers_; }
-  void setIdentifiers(std::vector<NDURLRef> identifiers) { identifiers_ = std::move(identifiers); }
+  [[nodiscard]] const std::vector<NDURL>& identifiers() const noexcept { return identifiers_; }
+  void setIdentifiers(std::vector<NDURL> identifiers) { identifiers_ = std::move(identifiers); }
 
  private:
-  std::vector<NDURLRef> identifiers_;
+  std::vector<NDURL> identifiers_;
 };
 
 }  // namespace nidus

@@ -23,14 +23,14 @@ std::string_view takeComponent(std::string_view& path) noexcept {
 
 }  // namespace
 
-NDURLRef NDURL::make(std::string_view scheme, std::string_view host, std::string_view path) {
+NDURL NDURL::make(std::string_view scheme, std::string_view host, std::string_view path) {
   std::string text;
   text.reserve(scheme.size() + 3 + host.size() + path.size());
   text.append(scheme).append("://").append(host).append(path);
   return fromText(text);
 }
 
-NDURLRef NDURL::fromText(NDString text) { return std::make_shared<NDURL>(std::move(text)); }
+NDURL NDURL::fromText(NDString text) { return NDURL(std::move(text)); }
 
 NDString NDURL::scheme() const {
   const std::size_t end = schemeEnd(text_.view());

@@ -1,7 +1,6 @@
 #pragma once
 
 #include <cstddef>
-#include <memory>
 #include <optional>
 #include <string_view>
 #include <utility>
@@ -12,26 +11,32 @@
 
 namespace nidus {
 
-class NDURL;
-/// A URL or null.
-using NDURLRef = std::shared_ptr<const NDURL>;
-
-/// A URL as an immutable object. Nothing is escaped or unescaped; what was given is what is read.
-/// May be used from any thread.
+/// A URL as an immutable object, shared by reference, that may be null. Nothing is escaped or
+/// unescaped; what was given is what is read. May be used from any thread.
 ///
-///     NDURLRef url = NDURL::make("x-corvane-nidus", "local", "/home?id=1");
-///     url->text();                // "x-corvane-nidus://local/home?id=1"
-///     url->pathComponents()[1];   // "home"
+///     NDURL url = NDURL::make("x-corvane-nidus", "local", "/home?id=1");
+///     url.text();                // "x-corvane-nidus://local/home?id=1"
+///     url.pathComponents()[1];   // "home"
 class ND_EXPORT NDURL {
  public:
+  /// Makes the null URL, of which no part may be asked for but its text.
+  NDURL() noexcept = default;
+  NDURL(std::nullptr_t) noexcept {}  // NOLINT(google-explicit-constructor): null is a URL
+
   /// Builds `scheme://host` followed by `path`, which may carry a query. Never null; each call
   /// gives a new object.
-  [[nodiscard]] static NDURLRef make(std::string_view scheme, std::string_view host,
-                                     std::string_view path);
-  /// Takes any text as it stands; a text without a scheme has a null scheme. Never null.
-  [[nodiscard]] static NDURLRef fromText(NDString text);
+  [[nodiscard]] static NDURL make(std::string_view scheme, std::string_view host,
+                                  std::string_view path);
+  /// Takes any text as it stands; a text without a scheme has a null scheme. The null
+  /// text gives the null URL.
+  [[nodiscard]] static NDURL fromText(NDString text);
 
-  /// The whole text, never null.
+  /// Says whether there is a URL.
+  explicit operator bool() const noexcept { return static_cast<bool>(text_); }
+  /// Compares the texts; null equals null alone.
+  friend bool operator==(const NDURL& a, const NDURL& b) noexcept { return a.text_ == b.text_; }
+
+  /// The whole text; null for the null URL alone.
   [[nodiscard]] const NDString& text() const noexcept { return text_; }
   /// The part before the first colon; null without a colon, or when a "/", "?" or "#" precedes it.
   [[nodiscard]] NDString scheme() const;
@@ -46,10 +51,8 @@ class ND_EXPORT NDURL {
   /// The query in this URL's own text; none where `query` gives null.
   [[nodiscard]] std::optional<std::string_view> queryView() const noexcept;
 
-  /// For the factories alone.
-  explicit NDURL(NDString text) : text_(std::move(text)) {}
-
  private:
+  explicit NDURL(NDString text) : text_(std::move(text)) {}
   [[nodiscard]] std::string_view path() const noexcept;
 
   NDString text_;
