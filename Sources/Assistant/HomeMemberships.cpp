@@ -1,17 +1,28 @@
 #include "Assistant/HomeMemberships.h"
 
 namespace nidus {
+namespace {
 
-HomeMemberships::HomeMemberships(const NDHome* home) {
-  if (!home) return;
-  nameGroups(*home);
-  for (const auto& zone : home->zones()) {
-    for (const auto& room : zone->rooms()) zoneNames_[room.get()] = zone->name();
-  }
+std::size_t placesInGroups(const NDHome* home) {
+  std::size_t count = 0;
+  if (!home) return count;
+  for (const auto& group : home->serviceGroups()) count += group->services().size();
+  return count;
 }
 
-void HomeMemberships::nameGroups(const NDHome& home) {
-  for (const auto& group : home.serviceGroups()) {
+std::size_t placesInZones(const NDHome* home) {
+  std::size_t count = 0;
+  if (!home) return count;
+  for (const auto& zone : home->zones()) count += zone->rooms().size();
+  return count;
+}
+
+}  // namespace
+
+HomeMemberships::HomeMemberships(const NDHome* home)
+    : groupNames_(placesInGroups(home)), zoneNames_(placesInZones(home)) {
+  if (!home) return;
+  for (const auto& group : home->serviceGroups()) {
     const TextList alone = {group->name()};  // of all services that are in no other group
     for (const auto& service : group->services()) {
       TextList& names = groupNames_[service.get()];
@@ -22,16 +33,17 @@ void HomeMemberships::nameGroups(const NDHome& home) {
       }
     }
   }
+  for (const auto& zone : home->zones()) {
+    for (const auto& room : zone->rooms()) zoneNames_[room.get()] = zone->name();
+  }
 }
 
-TextList HomeMemberships::groupNames(const NDService& service) const {
-  const auto found = groupNames_.find(&service);
-  return found == groupNames_.end() ? TextList() : found->second;
+const TextList& HomeMemberships::groupNames(const NDService& service) const {
+  return groupNames_.find(&service);
 }
 
-NDString HomeMemberships::zoneName(const NDRoom& room) const {
-  const auto found = zoneNames_.find(&room);
-  return found == zoneNames_.end() ? NDString() : found->second;
+const NDString& HomeMemberships::zoneName(const NDRoom& room) const {
+  return zoneNames_.find(&room);
 }
 
 }  // namespace nidus

@@ -1,7 +1,6 @@
 #pragma once
 
-#include <unordered_map>
-
+#include "Assistant/AddressTable.h"
 #include "Assistant/TextList.h"
 #include "PlatformModel/Home/NDHome.h"
 #include "PlatformModel/System/NDString.h"
@@ -18,16 +17,14 @@ class HomeMemberships {
 
   /// The names of the groups that hold `service`, in the order of the home's groups, once per time
   /// that a group lists it; may be empty.
-  [[nodiscard]] TextList groupNames(const NDService& service) const;
+  [[nodiscard]] const TextList& groupNames(const NDService& service) const;
 
   /// The name of the last of the home's zones that contains `room`; null when none does.
-  [[nodiscard]] NDString zoneName(const NDRoom& room) const;
+  [[nodiscard]] const NDString& zoneName(const NDRoom& room) const;
 
  private:
-  void nameGroups(const NDHome& home);
-
-  std::unordered_map<const NDService*, TextList> groupNames_;
-  std::unordered_map<const NDRoom*, NDString> zoneNames_;
+  AddressTable<TextList> groupNames_;
+  AddressTable<NDString> zoneNames_;
 };
 
 }  // namespace nidus
