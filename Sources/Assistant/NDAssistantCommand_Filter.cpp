@@ -52,6 +52,31 @@ bool isRoom(const HomeObjectRecord& object, const NDString& roomName, const NDSt
          (!roomName || isEqualButDiacritics(object.objectName, roomName));
 }
 
+/// Lets names without diacritics be looked for by code points, or by a text of ASCII as it stands.
+struct PlainNameHash {
+  using is_transparent = void;
+  template <class Text>
+  std::size_t operator()(const Text& name) const noexcept {
+    std::size_t mixed = 0;
+    for (const auto character : name) mixed = mixed * 131 + static_cast<char32_t>(character);
+    return mixed;
+  }
+};
+struct PlainNameEqual {
+  using is_transparent = void;
+  template <class A, class B>
+  bool operator()(const A& a, const B& b) const noexcept {
+    return std::equal(a.begin(), a.end(), b.begin(), b.end(), [](auto x, auto y) {
+      return static_cast<char32_t>(x) == static_cast<char32_t>(y);
+    });
+  }
+};
+
+bool isASCII(std::string_view text) {
+  return std::all_of(text.begin(), text.end(),
+                     [](char c) { return static_cast<unsigned char>(c) < 0x80; });
+}
+
 /// The records of a list that are in certain rooms, by the names of these, diacritics ignored.
 class ObjectsByRoom {
  public:
@@ -77,11 +102,12 @@ class ObjectsByRoom {
 
  private:
   ObjectList* placeOf(std::string_view roomName) {
-    const auto found = byName_.find(withoutDiacritics(roomName));
+    const auto found =
+        isASCII(roomName) ? byName_.find(roomName) : byName_.find(withoutDiacritics(roomName));
     return found == byName_.end() ? nullptr : &found->second;
   }
 
-  std::unordered_map<std::u32string, ObjectList> byName_;
+  std::unordered_map<std::u32string, ObjectList, PlainNameHash, PlainNameEqual> byName_;
 };
 
 /// One search: narrows the snapshot field by field of the filter. A step runs only while there is
