@@ -12,6 +12,7 @@ constexpr std::size_t kRoomsPerZone = 5;
 constexpr std::size_t kServicesPerGroup = 20;
 constexpr std::size_t kMembersOfGroup = 10;
 constexpr std::int64_t kServiceID = 8;
+constexpr std::int64_t kBrightnessID = 10;
 
 NDUUID makeUUID(std::uint8_t kind, std::size_t number) {
   std::array<std::uint8_t, 16> bytes{};
@@ -41,9 +42,10 @@ ServiceData lightService() {
   ServiceData service;
   service.instanceID = kServiceID;
   service.serviceType = "com.corvane.nidus.service.light";
-  service.characteristics = {characteristic(9, "power", "bool", NDValue::boolean(true)),
-                             characteristic(10, "brightness", "int", NDValue::integer(40)),
-                             characteristic(11, "hue", "float", NDValue::floating(120))};
+  service.characteristics = {
+      characteristic(9, "power", "bool", NDValue::boolean(true)),
+      characteristic(kBrightnessID, "brightness", "int", NDValue::integer(40)),
+      characteristic(11, "hue", "float", NDValue::floating(120))};
   return service;
 }
 
@@ -85,6 +87,16 @@ void addGroups(HomeData& home, const HomeShape& shape) {
   }
 }
 
+void addScene(HomeData& home, const HomeShape& shape) {
+  ActionSetData& scene = home.actionSets.emplace_back();
+  scene.uuid = makeUUID(6, 0);
+  scene.name = kSceneName;
+  for (std::size_t number = 0; number < std::min(kServicesPerRoom, shape.services); ++number) {
+    scene.actions.push_back(
+        {{accessoryID(number), kServiceID, kBrightnessID}, NDValue::integer(20)});
+  }
+}
+
 }  // namespace
 
 NDString numberedName(const std::string& word, std::size_t number, std::size_t length) {
@@ -100,6 +112,7 @@ HomeData benchmarkHome(const HomeShape& shape) {
   addRoomsAndZones(home, shape);
   addAccessories(home, shape);
   addGroups(home, shape);
+  if (shape.hasScene) addScene(home, shape);
   return home;
 }
 

@@ -11,6 +11,7 @@ struct HomeShape {
   std::size_t services = 0;
   std::size_t nameLength = 12;  ///< Of every name, in bytes; at least 12.
   bool hasAccents = false;      ///< Whether the services' names begin with an accented word.
+  bool hasScene = false;        ///< Whether there is a scene; it dims the lights of the first room.
   // NOLINTNEXTLINE(modernize-use-nullptr): a mistake of the check about defaulted comparisons
   friend auto operator<=>(const HomeShape&, const HomeShape&) = default;
 };
@@ -18,6 +19,9 @@ struct HomeShape {
 /// The words that the names of services begin with; they differ in an accent alone.
 inline constexpr const char* kServiceWord = "Lampe";
 inline constexpr const char* kAccentedServiceWord = "L\u00e4mpe";
+
+/// The name of the scene.
+inline constexpr const char* kSceneName = "Good Night";
 
 /// The name that begins with `word` and ends with `number`, filled up with zeros to `length` bytes.
 [[nodiscard]] NDString numberedName(const std::string& word, std::size_t number,

@@ -23,4 +23,17 @@ BrightnessRequest::BrightnessRequest(std::string_view actionType, const NDString
   setActions({std::move(action)});
 }
 
+SceneRequest::SceneRequest(const NDString& sceneName) {
+  auto filter = std::make_shared<VAHASearchCriteriaFilter>();
+  filter->setSceneName(sceneName);
+  auto value = VAHABooleanValue::booleanValue();
+  value->setValue(true);
+  auto action = std::make_shared<VAHAAction>();
+  action->setActionType(VAHAActionTypeSETValue);
+  action->setAttribute(VAHAAttributeENABLEDValue);
+  action->setValue(std::move(value));
+  setFilter(std::move(filter));
+  setActions({std::move(action)});
+}
+
 }  // namespace nidus

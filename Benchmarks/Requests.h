@@ -12,4 +12,9 @@ struct BrightnessRequest : VAHACommand {
   BrightnessRequest(std::string_view actionType, const NDString& serviceName);
 };
 
+/// Runs a scene.
+struct SceneRequest : VAHACommand {
+  explicit SceneRequest(const NDString& sceneName);
+};
+
 }  // namespace nidus

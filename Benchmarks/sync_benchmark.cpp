@@ -1,58 +1,13 @@
 #include <memory>
 #include <utility>
 
-#include "Assistant/NDAssistantSyncHome.h"
 #include "BenchmarkPlatform.h"
+#include "BenchmarkSync.h"
 #include "Floors.h"
 #include "Measurement.h"
 
 namespace nidus {
 namespace {
-
-class BeginInfo final : public AFSyncBeginInfo {
- public:
-  void resetWithValidity(const NDString& /*validity*/) override {}
-};
-
-/// Keeps what was pulled last.
-class ChangeInfo final : public AFSyncChangeInfo {
- public:
-  void setObject(std::shared_ptr<const VAHAEntity> object) override { entity = std::move(object); }
-  void setPostAnchor(const NDString& anchor) override { postAnchor = anchor; }
-
-  std::shared_ptr<const VAHAEntity> entity;
-  NDString postAnchor;
-};
-
-/// One handler of syncs.
-class Sync {
- public:
-  /// Begins a sync on the platform that is registered.
-  void begin(const BenchmarkPlatform& platform) {
-    handler_->beginSyncWithAnchor_validity_forKey_beginInfo(
-        nullptr, nullptr, "com.corvane.nidus.name", std::make_shared<BeginInfo>());
-    platform.drain();
-  }
-  /// Pulls to the end and gives the number of entities.
-  std::size_t pullAll() {
-    ChangeInfo info;
-    std::size_t entities = 0;
-    for (;;) {
-      handler_->getChangeAfterAnchor_changeInfo(info.postAnchor, info);
-      if (!info.entity) return entities;
-      ++entities;
-    }
-  }
-  void pullAfter(const NDString& anchor) {
-    ChangeInfo info;
-    handler_->getChangeAfterAnchor_changeInfo(anchor, info);
-    benchmark::DoNotOptimize(info.entity.get());
-  }
-  void end() { handler_->syncDidEnd(); }
-
- private:
-  const std::shared_ptr<NDAssistantSyncHome> handler_ = NDAssistantSyncHome::init();
-};
 
 HomeShape shapeOf(std::int64_t services, std::size_t nameLength) {
   return {static_cast<std::size_t>(services), nameLength};
@@ -62,7 +17,7 @@ HomeShape shapeOf(std::int64_t services, std::size_t nameLength) {
 void BM_Sync(benchmark::State& state, std::size_t nameLength, const Row& row) {
   const BenchmarkPlatform platform(BenchmarkPlatform::Kind::light,
                                    shapeOf(state.range(0), nameLength));
-  Sync sync;
+  BenchmarkSync sync;
   const auto gather = platform.gather();
   const HomeObjectRecords records = gather->gatherNidusObjects();
   std::vector<AnswerTexts> texts;
@@ -97,11 +52,11 @@ class LatePull {
     anchor_ = std::to_string(sync_.pullAll() - 2);
     platform_ = nullptr;
   }
-  void operator()() { sync_.pullAfter(anchor_); }
+  void operator()() { benchmark::DoNotOptimize(sync_.pullAfter(anchor_).get()); }
 
  private:
   std::unique_ptr<BenchmarkPlatform> platform_;
-  Sync sync_;
+  BenchmarkSync sync_;
   NDString anchor_;
 };
 
