@@ -36,8 +36,8 @@ class URLText {
   }
 
   /// An object that is gone reads as a null does in every text of the plug-in.
-  template <class Object>
-  URLText& uuidOf(const Object* object) {
+  template <class Pointer>
+  URLText& uuidOf(const Pointer& object) {
     return object ? uuid(object->uuid()) : text("(null)");
   }
 
@@ -54,7 +54,7 @@ class URLText {
 template <class Object>
 NDURL urlInHome(std::string_view path, const Object& object) {
   const std::shared_ptr<NDHome> home = object.home();
-  return URLText(path).uuid(object.uuid()).text("&home=").uuidOf(home.get()).makeURL();
+  return URLText(path).uuid(object.uuid()).text("&home=").uuidOf(home).makeURL();
 }
 
 }  // namespace
