@@ -36,15 +36,16 @@ Texts textsOf(const std::string& call) {
   return texts;
 }
 
+constexpr const char kUpdate[] =
+    "-[NDAssistantCommand handleUpdateActionTypes:serviceType:forObjects:completionHandler:]";
+
 /// Whoever runs a home is promised that the log tells no more of it than these messages do.
 TEST(LogTextsTest, AreThePromisedOnes) {
   EXPECT_EQ(
       textsOf("WLOLog("),
       (Texts{"%s ### Vela passed an incorrect action (%@) to a %@ value type.",
              "%s ### Vela sent an unsupported action type: %@",
-             "-[NDAssistantCommand handleCommandWithCompletionHandler:]",
-             "-[NDAssistantCommand "
-             "handleUpdateActionTypes:serviceType:forObjects:completionHandler:]",
+             "-[NDAssistantCommand handleCommandWithCompletionHandler:]", kUpdate,
              "ActionSet action value %@ not true",
              "Attribute specified in search filter with entityType not SERVICE(%@)",
              "Filtered object %@ not a service", "Incoming Action: %@",

@@ -216,6 +216,12 @@ TEST_F(FilterTest, MatchesRoomWithoutItsAccents) {
   EXPECT_THAT(log(), ElementsAre("6 Incoming Filter: room=Cafe/"));
 }
 
+TEST_F(FilterTest, FindsRoomsOfNoASCII) {
+  snapshot({roomRecord("\u53f0\u6240"), serviceInRoom("Lamp", "\u53f0\u6240"),
+            serviceInRoom("Fan", "\u6240")});
+  EXPECT_THAT(find({.room = "\u53f0\u6240"}), ElementsAre("Lamp"));
+}
+
 TEST_F(FilterTest, WritesZoneBeforeRoom) {
   snapshot({roomRecord("Hall", "Upstairs"), serviceInRoom("Lamp", "Hall")});
   EXPECT_THAT(find({.room = "Hall", .zone = "Upstairs"}), ElementsAre("Lamp"));

@@ -290,6 +290,14 @@ TEST_F(NDAssistantGatherTest, GroupIsNamedOncePerMembership) {
   EXPECT_THAT(recordOf("Lamp").objectGroups, ElementsAre("Evening", "Evening"));
 }
 
+TEST_F(NDAssistantGatherTest, ServicesOfOneMakeShareTheirLists) {
+  useHome(HomeBuilder("Cabin").light("Lamp").light("Bulb").group("Evening", {"Lamp", "Bulb"}));
+  const HomeObjectRecords all = records();
+  ASSERT_EQ(all.size(), 4U);  // the home, both lights, the group
+  EXPECT_EQ(all[1].objectCharacteristics.begin(), all[2].objectCharacteristics.begin());
+  EXPECT_EQ(all[1].objectGroups.begin(), all[2].objectGroups.begin());
+}
+
 TEST_F(NDAssistantGatherTest, BareServiceLeavesKeysOut) {
   useHome(HomeBuilder("Cabin").light("Lamp"));
   const HomeObjectRecord record = recordOf("Lamp");
