@@ -290,6 +290,16 @@ TEST_F(NDAssistantGatherTest, GroupIsNamedOncePerMembership) {
   EXPECT_THAT(recordOf("Lamp").objectGroups, ElementsAre("Evening", "Evening"));
 }
 
+TEST_F(NDAssistantGatherTest, WithoutPlatformNoServiceCanBeAddressed) {
+  const auto home = useHome(HomeBuilder("Cabin").light("Lamp"));
+  const auto gather = gathered();
+  NDPlatform::unregisterPlatform(TestPlatform::shared());
+  HomeObjectRecords list;
+  gather->addToList_service(list, home->service("Lamp"));
+  EXPECT_THAT(list, IsEmpty());
+  EXPECT_EQ(NDPlatform::registerPlatform(TestPlatform::shared()), "");
+}
+
 TEST_F(NDAssistantGatherTest, ServicesOfOneMakeShareTheirLists) {
   useHome(HomeBuilder("Cabin").light("Lamp").light("Bulb").group("Evening", {"Lamp", "Bulb"}));
   const HomeObjectRecords all = records();
