@@ -94,7 +94,7 @@ void checkHome(const HomeData& data) {
 std::string takeText(FuzzedDataProvider& input, const HomeData& data) {
   if (input.ConsumeBool()) return input.ConsumeRemainingBytesAsString();
   const auto home = HomeObject::make(std::make_shared<const HomeData>(data), {});
-  std::string text = url(*home->accessories()[0]->services()[0])->text().str();
+  std::string text = url(*home->accessories()[0]->services()[0]).text().str();
   while (input.remaining_bytes() > 0 && !text.empty()) {
     const auto at = input.ConsumeIntegralInRange<std::size_t>(0, text.size() - 1);
     const auto length = input.ConsumeIntegralInRange<std::size_t>(0, 8);
@@ -104,19 +104,19 @@ std::string takeText(FuzzedDataProvider& input, const HomeData& data) {
 }
 
 void checkAnyURL(const NDURL& any) {
-  const NDString scheme = any->scheme();
-  if (scheme && !any->text().view().starts_with(scheme.str() + ':')) {
-    reportFinding("A URL does not begin with its scheme: " + any->text().str());
+  const NDString scheme = any.scheme();
+  if (scheme && !any.text().view().starts_with(scheme.str() + ':')) {
+    reportFinding("A URL does not begin with its scheme: " + any.text().str());
   }
-  const NDString query = any->query();
-  if (query && any->text().view().find('?' + query.str()) == std::string_view::npos) {
-    reportFinding("A URL does not have its query: " + any->text().str());
+  const NDString query = any.query();
+  if (query && any.text().view().find('?' + query.str()) == std::string_view::npos) {
+    reportFinding("A URL does not have its query: " + any.text().str());
   }
   HomeObjectRecord record;
   record.objectIdentifier = any;
   try {
     if (serviceFromObject(record, nullptr) || actionSetFromObject(record, nullptr)) {
-      reportFinding("An object is found without homes: " + any->text().str());
+      reportFinding("An object is found without homes: " + any.text().str());
     }
   } catch (const std::out_of_range&) {
     return;  // what is promised for a path or a query that ends too soon
