@@ -31,7 +31,7 @@ class ND_EXPORT NDAssistantCommandObserver {
 
 /// The version of everything that crosses the border between a host and the module. It grows with
 /// each change of `PlatformModel` or of the struct below.
-inline constexpr std::uint32_t kNDAssistantModuleInterfaceVersion = 2;
+inline constexpr std::uint32_t kNDAssistantModuleInterfaceVersion = 3;
 
 #define ND_TEXT_OF(x) #x
 #define ND_TEXT(x) ND_TEXT_OF(x)
