@@ -1,5 +1,6 @@
 #include "HomePlatform/Objects/AccessoryObject.h"
 
+#include <algorithm>
 #include <utility>
 #include <vector>
 
@@ -19,7 +20,7 @@ std::shared_ptr<AccessoryObject> AccessoryObject::make(
                                            data->uuid, accessory));
   }
   accessory->services_ = NDArray<NDService>(std::move(services));
-  accessory->listCharacteristics();
+  accessory->sortParts();
   return accessory;
 }
 
@@ -29,29 +30,33 @@ AccessoryObject::AccessoryObject(std::shared_ptr<const AccessoryData> data,
 
 const std::shared_ptr<NDService>& AccessoryObject::findService(std::int64_t instanceID) const {
   static const std::shared_ptr<NDService> kNone;
-  const auto& all = data().services;
-  for (std::size_t index = 0; index < all.size(); ++index) {
-    if (all[index].instanceID == instanceID) return services_[index];
-  }
-  return kNone;
+  const auto found = std::lower_bound(serviceIndexes_.begin(), serviceIndexes_.end(),
+                                      std::pair(instanceID, std::size_t{0}));
+  const bool isThere = found != serviceIndexes_.end() && found->first == instanceID;
+  return isThere ? services_[found->second] : kNone;
 }
 
 FoundCharacteristic AccessoryObject::find(std::int64_t service, std::int64_t characteristic) const {
-  for (const Place& place : places_) {
-    if (place.serviceID == service && place.characteristicID == characteristic) return place.found;
-  }
-  return {};
+  const auto found = std::lower_bound(places_.begin(), places_.end(),
+                                      Place{service, characteristic, {}}, &Place::isBefore);
+  const bool isThere = found != places_.end() && found->serviceID == service &&
+                       found->characteristicID == characteristic;
+  return isThere ? found->found : FoundCharacteristic();
 }
 
-void AccessoryObject::listCharacteristics() {
-  for (const auto& element : services_) {
-    const auto& service = static_cast<const ServiceObject&>(*element);
+/// Makes the tables of the look-ups: a bridge may have very many parts.
+void AccessoryObject::sortParts() {
+  for (std::size_t index = 0; index < services_.size(); ++index) {
+    const auto& service = static_cast<const ServiceObject&>(*services_[index]);
+    serviceIndexes_.emplace_back(service.instanceID(), index);
     for (const auto& each : service.characteristics()) {
       auto& characteristic = static_cast<CharacteristicObject&>(*each);
       places_.push_back(
           {service.instanceID(), each->instanceID(), {this, &service, &characteristic}});
     }
   }
+  std::sort(serviceIndexes_.begin(), serviceIndexes_.end());
+  std::sort(places_.begin(), places_.end(), &Place::isBefore);
 }
 
 }  // namespace nidus

@@ -1,7 +1,9 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <utility>
 #include <vector>
 
 #include "HomePlatform/Objects/HomePart.h"
@@ -41,16 +43,22 @@ class AccessoryObject final : public HomePart<NDAccessory, AccessoryData> {
   [[nodiscard]] FoundCharacteristic find(std::int64_t service, std::int64_t characteristic) const;
 
  private:
-  void listCharacteristics();
+  void sortParts();
 
   const std::weak_ptr<NDRoom> room_;
   // Complete when `make` returns.
   NDArray<NDService> services_;
-  /// All characteristics side by side, because batches look up one after the other.
+  std::vector<std::pair<std::int64_t, std::size_t>> serviceIndexes_;  ///< By instance ID, sorted.
+  /// All characteristics side by side, because batches look up one after the other; sorted.
   struct Place {
     std::int64_t serviceID;
     std::int64_t characteristicID;
     FoundCharacteristic found;
+
+    static bool isBefore(const Place& a, const Place& b) {
+      return std::pair(a.serviceID, a.characteristicID) <
+             std::pair(b.serviceID, b.characteristicID);
+    }
   };
   std::vector<Place> places_;
 };

@@ -76,6 +76,29 @@ TEST_F(HomeObjectTest, ZonesAndGroupsShareObjects) {
   EXPECT_EQ(home_->serviceGroups()[0]->services()[0], home_->accessories()[1]->services()[0]);
 }
 
+TEST_F(HomeObjectTest, PartsAreFoundInWhateverOrderTheirNumbersAre) {
+  HomeData data = sampleHome();
+  AccessoryData& lamp = lampOf(data);
+  ServiceData second = lamp.services[0];
+  lamp.services[0].instanceID = 20;
+  std::swap(lamp.services[0].characteristics[0], lamp.services[0].characteristics[1]);
+  second.instanceID = 4;
+  second.characteristics.resize(1);
+  second.characteristics[0].instanceID = 1;
+  lamp.services.push_back(second);
+  data.serviceGroups.push_back(
+      {uuidOf(kDoorID), "All", {{uuidOf(kLampID), 4}, {uuidOf(kLampID), 20}}});
+  open(data);
+  const auto& services = home_->accessories()[0]->services();
+  const auto& members = home_->serviceGroups()[0]->services();
+  ASSERT_EQ(members.size(), 2U);
+  EXPECT_EQ(members[0], services[1]);
+  EXPECT_EQ(members[1], services[0]);
+  const NDUUID id = uuidOf(kLampID);
+  EXPECT_THAT(read(*platform_, home_, {{id, 20, 9}, {id, 4, 1}, {id, 20, 10}}).codes,
+              ElementsAre(0, 0, 0));
+}
+
 TEST_F(HomeObjectTest, ChildrenFindTheirParents) {
   open(sampleHome());
   const auto characteristic = characteristicAt(home_, powerAddress());
