@@ -1,6 +1,6 @@
 #include "BenchmarkSync.h"
 
-#include <utility>
+#include "Support/PulledChange.h"
 
 namespace nidus {
 namespace {
@@ -8,16 +8,6 @@ namespace {
 class BeginInfo final : public AFSyncBeginInfo {
  public:
   void resetWithValidity(const NDString& /*validity*/) override {}
-};
-
-/// Keeps what was pulled last.
-class ChangeInfo final : public AFSyncChangeInfo {
- public:
-  void setObject(std::shared_ptr<const VAHAEntity> object) override { entity = std::move(object); }
-  void setPostAnchor(const NDString& anchor) override { postAnchor = anchor; }
-
-  std::shared_ptr<const VAHAEntity> entity;
-  NDString postAnchor;
 };
 
 }  // namespace
@@ -29,7 +19,7 @@ void BenchmarkSync::begin(const BenchmarkPlatform& platform) const {
 }
 
 std::size_t BenchmarkSync::pullAll() const {
-  ChangeInfo info;
+  PulledChange info;
   std::size_t entities = 0;
   for (;;) {
     handler_->getChangeAfterAnchor_changeInfo(info.postAnchor, info);
@@ -39,7 +29,7 @@ std::size_t BenchmarkSync::pullAll() const {
 }
 
 std::shared_ptr<const VAHAEntity> BenchmarkSync::pullAfter(const NDString& anchor) const {
-  ChangeInfo info;
+  PulledChange info;
   handler_->getChangeAfterAnchor_changeInfo(anchor, info);
   return info.entity;
 }

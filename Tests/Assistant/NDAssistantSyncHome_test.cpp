@@ -11,6 +11,7 @@
 #include "PlatformModel/System/NDSerialQueue.h"
 #include "Support/InlineQueue.h"
 #include "Support/PlatformTest.h"
+#include "Support/PulledChange.h"
 #include "Support/TestTypes.h"
 
 namespace nidus {
@@ -35,14 +36,6 @@ class BeginInfo final : public AFSyncBeginInfo {
   std::function<void()> onReset;
 };
 
-class ChangeInfo final : public AFSyncChangeInfo {
- public:
-  void setObject(std::shared_ptr<const VAHAEntity> object) override { entity = std::move(object); }
-  void setPostAnchor(const NDString& anchor) override { postAnchor = textOf(anchor); }
-  std::shared_ptr<const VAHAEntity> entity;
-  std::string postAnchor;
-};
-
 class NDAssistantSyncHomeTest : public PlatformTest {
  protected:
   NDAssistantSyncHomeTest() : sync_(NDAssistantSyncHome::init()) {}
@@ -55,11 +48,20 @@ class NDAssistantSyncHomeTest : public PlatformTest {
     return info;
   }
 
+  /// Begins a sync whose homes come while it waits, but are read after that.
+  std::shared_ptr<BeginInfo> beginAnsweredTooLate() {
+    useHome(fourObjects());
+    platform().setSilent(true);
+    sync_->setQueue(platform().mainQueue());  // which a wait does not run
+    platform().sharedQueue()->async([] { platform().lastManager()->report(); });
+    return begin();
+  }
+
   /// What follows `anchor`: "Lamp 3", or "end 3" at the end of the data.
   std::string change(const NDString& anchor) {
-    ChangeInfo info;
+    PulledChange info;
     sync_->getChangeAfterAnchor_changeInfo(anchor, info);
-    return (info.entity ? info.entity->name().str() : "end") + " " + info.postAnchor;
+    return (info.entity ? info.entity->name().str() : "end") + " " + textOf(info.postAnchor);
   }
 
   /// All that the assistant pulls, the end included.
@@ -344,11 +346,7 @@ TEST_F(NDAssistantSyncHomeTest, LateSnapshotResetsAllTheSame) {
 }
 
 TEST_F(NDAssistantSyncHomeTest, SnapshotAfterTheTimeOutSilencesTheWatchdog) {
-  useHome(fourObjects());
-  platform().setSilent(true);
-  sync_->setQueue(platform().mainQueue());  // which a wait does not run
-  platform().sharedQueue()->async([] { platform().lastManager()->report(); });
-  const auto info = begin();
+  const auto info = beginAnsweredTooLate();
   EXPECT_THAT(info->resets, IsEmpty());
   platform().runUntilIdle();
   EXPECT_THAT(info->resets, ElementsAre("3405691582"));
@@ -356,11 +354,7 @@ TEST_F(NDAssistantSyncHomeTest, SnapshotAfterTheTimeOutSilencesTheWatchdog) {
 }
 
 TEST_F(NDAssistantSyncHomeTest, ResetsBeforeTheGroupIsLeft) {
-  useHome(fourObjects());
-  platform().setSilent(true);
-  sync_->setQueue(platform().mainQueue());  // which a wait does not run
-  platform().sharedQueue()->async([] { platform().lastManager()->report(); });
-  const auto info = begin();
+  const auto info = beginAnsweredTooLate();
   Texts resets;
   sync_->group()->notify(std::make_shared<InlineQueue>(), [&] { resets = info->resets; });
   platform().runUntilIdle();

@@ -4,6 +4,7 @@
 #include "Assistant/NDAssistantSyncHome.h"
 #include "Load/Performance.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
+#include "Support/PulledChange.h"
 
 namespace nidus {
 namespace {
@@ -35,36 +36,24 @@ class BeginInfo final : public AFSyncBeginInfo {
   std::vector<NDString> resets_ ND_GUARDED_BY(mutex_);
 };
 
-class ChangeInfo final : public AFSyncChangeInfo {
- public:
-  void setObject(std::shared_ptr<const VAHAEntity> object) override { object_ = std::move(object); }
-  void setPostAnchor(const NDString& anchor) override { anchor_ = anchor; }
-  [[nodiscard]] const std::shared_ptr<const VAHAEntity>& object() const { return object_; }
-  [[nodiscard]] const NDString& anchor() const { return anchor_; }
-
- private:
-  std::shared_ptr<const VAHAEntity> object_;
-  NDString anchor_;
-};
-
 using Entities = std::vector<std::shared_ptr<const VAHAEntity>>;
 
 /// Asks for one change after the other. The anchors count up to the last one, which is final; a
 /// handler whose homes come while it is asked has nothing first and everything then.
 Entities pull(NDAssistantSyncHome& handler, StressRecord& record) {
   Entities entities;
-  ChangeInfo change;
+  PulledChange change;
   NDString anchor;
   for (;;) {
     handler.getChangeAfterAnchor_changeInfo(anchor, change);
-    if (!change.object()) break;
-    entities.push_back(change.object());
-    anchor = change.anchor();
+    if (!change.entity) break;
+    entities.push_back(change.entity);
+    anchor = change.postAnchor;
     const bool isCounted = anchor == NDString(std::to_string(entities.size()));
     record.expect(isCounted || anchor == kFinalAnchor, "an anchor is out of order", "a sync");
   }
   record.expect(entities.empty() || anchor == kFinalAnchor, "entities are missing", "a sync");
-  record.expect(change.anchor() == anchor, "the end has an anchor of its own", "a sync");
+  record.expect(change.postAnchor == anchor, "the end has an anchor of its own", "a sync");
   return entities;
 }
 

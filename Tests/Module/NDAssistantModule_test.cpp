@@ -17,6 +17,7 @@
 #include "Support/ElfFile.h"
 #include "Support/FreshProcess.h"
 #include "Support/HomeBuilder.h"
+#include "Support/PulledChange.h"
 #include "Support/TestPlatform.h"
 
 namespace nidus {
@@ -61,14 +62,6 @@ class BeginInfo final : public AFSyncBeginInfo {
  public:
   void resetWithValidity(const NDString& validity) override { resets.push_back(validity); }
   std::vector<NDString> resets;
-};
-
-class ChangeInfo final : public AFSyncChangeInfo {
- public:
-  void setObject(std::shared_ptr<const VAHAEntity> object) override { entity = std::move(object); }
-  void setPostAnchor(const NDString& anchor) override { postAnchor = anchor; }
-  std::shared_ptr<const VAHAEntity> entity;
-  NDString postAnchor;
 };
 
 TEST(NDAssistantModuleTest, TellsItsVersions) {
@@ -195,7 +188,7 @@ TEST_F(OpenModuleTest, SyncServesAnEntity) {
   handler->beginSyncWithAnchor_validity_forKey_beginInfo(nullptr, nullptr, "com.corvane.nidus.name",
                                                          begin);
   EXPECT_THAT(begin->resets, ElementsAre("3405691582"));
-  ChangeInfo change;
+  PulledChange change;
   handler->getChangeAfterAnchor_changeInfo("1", change);
   ASSERT_TRUE(change.entity);
   EXPECT_EQ(change.entity->name(), "Lamp");

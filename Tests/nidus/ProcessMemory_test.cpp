@@ -58,20 +58,10 @@ class ProcessMemoryTest : public ProgramTest {
 };
 
 std::string lampOf(std::size_t number) {
-  const std::string name = "Lamp " + std::to_string(number);
-  return R"({"uuid": ")" + uuidOf(number) + R"(", "name": ")" + name +
-         R"(", "services": [{"instanceID": 8, "name": ")" + name +
-         R"(", "serviceType": "com.corvane.nidus.service.light", "characteristics": [
-             {"instanceID": 9, "characteristicType": "com.corvane.nidus.characteristic.power",
-              "properties": ["readable", "writable"], "value": true,
-              "metadata": {"format": "bool"}},
-             {"instanceID": 10, "characteristicType": "com.corvane.nidus.characteristic.brightness",
-              "properties": ["readable", "writable"], "value": 40,
-              "metadata": {"format": "int", "units": "percentage", "minimumValue": 0,
-                           "maximumValue": 100}}]}]})";
+  return lampDocument(uuidOf(number), "Lamp " + std::to_string(number));
 }
 
-TEST_F(ProcessMemoryTest, StaysWithinItsBoundAtAllWorkOnALargeHome) {
+TEST_F(ProcessMemoryTest, ReadsALargeHomeWithinItsBound) {
   const std::size_t services = isLongForm() ? 100'000 : 200;
   const std::string home = folder_.file("home.json");
   {

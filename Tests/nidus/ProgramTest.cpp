@@ -4,17 +4,9 @@ namespace nidus {
 namespace {
 
 std::string lamp(const std::string& name, const std::string& number, bool reachable) {
-  return R"({"uuid": "DD00DD00-0000-4000-8000-00000000000)" + number + R"(", "name": ")" + name +
-         R"(", "room": "BB00BB00-0000-4000-8000-000000000001", "reachable": )" +
-         (reachable ? "true" : "false") + R"(, "services": [{"instanceID": 8, "name": ")" + name +
-         R"(", "serviceType": "com.corvane.nidus.service.light", "characteristics": [
-             {"instanceID": 9, "characteristicType": "com.corvane.nidus.characteristic.power",
-              "properties": ["readable", "writable"], "value": true,
-              "metadata": {"format": "bool"}},
-             {"instanceID": 10, "characteristicType": "com.corvane.nidus.characteristic.brightness",
-              "properties": ["readable", "writable"], "value": 40,
-              "metadata": {"format": "int", "units": "percentage", "minimumValue": 0,
-                           "maximumValue": 100}}]}]})";
+  return lampDocument("DD00DD00-0000-4000-8000-00000000000" + number, name,
+                      R"("room": "BB00BB00-0000-4000-8000-000000000001", "reachable": )" +
+                          std::string(reachable ? "true, " : "false, "));
 }
 
 constexpr const char kLock[] =
@@ -26,6 +18,20 @@ constexpr const char kLock[] =
            "metadata": {"format": "bool"}}]}]})";
 
 }  // namespace
+
+std::string lampDocument(const std::string& uuid, const std::string& name,
+                         const std::string& more) {
+  return R"({"uuid": ")" + uuid + R"(", "name": ")" + name + R"(", )" + more +
+         R"("services": [{"instanceID": 8, "name": ")" + name +
+         R"(", "serviceType": "com.corvane.nidus.service.light", "characteristics": [
+             {"instanceID": 9, "characteristicType": "com.corvane.nidus.characteristic.power",
+              "properties": ["readable", "writable"], "value": true,
+              "metadata": {"format": "bool"}},
+             {"instanceID": 10, "characteristicType": "com.corvane.nidus.characteristic.brightness",
+              "properties": ["readable", "writable"], "value": 40,
+              "metadata": {"format": "int", "units": "percentage", "minimumValue": 0,
+                           "maximumValue": 100}}]}]})";
+}
 
 std::string smallHome() {
   return R"({"uuid": "AA00AA00-0000-4000-8000-000000000001", "name": "Cottage", "primary": true,

@@ -14,6 +14,11 @@ namespace nidus {
 /// A home with two lamps in one kitchen, a lock that wants an unlocked device, and two scenes.
 [[nodiscard]] std::string smallHome();
 
+/// An accessory with one light that has power and brightness; `more` are further members of it,
+/// each with a comma behind it.
+[[nodiscard]] std::string lampDocument(const std::string& uuid, const std::string& name,
+                                       const std::string& more = "");
+
 /// A home of the given name that has nothing in it; its UUID ends in `number`, one digit.
 [[nodiscard]] std::string emptyHome(const std::string& name, int number);
 
