@@ -22,7 +22,7 @@ constexpr unsigned short kRows = 24;
 int openTerminal() {
   const int terminal = posix_openpt(O_RDWR | O_NOCTTY | O_CLOEXEC);
   if (terminal < 0 || grantpt(terminal) != 0 || unlockpt(terminal) != 0) {
-    throw std::runtime_error("no terminal");
+    throw std::runtime_error("this machine has no pseudo-terminals; mount devpts at /dev/pts");
   }
   return terminal;
 }
