@@ -29,6 +29,9 @@ class OpenPlatform {
   std::shared_ptr<HomePlatform> platform_;
 };
 
+/// A platform with its homes in memory, whose work is done by whoever drains it.
+inline HomePlatformOptions onCaller() { return {.drainsOnCaller = true}; }
+
 /// Hears of the updates of one manager.
 class DelegateProbe final : public NDHomeManagerDelegate {
  public:
