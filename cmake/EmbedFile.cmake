@@ -25,4 +25,5 @@ function(nidus_embed target file name)
             -P ${NIDUS_EMBED_SCRIPT}
     DEPENDS ${file} ${NIDUS_EMBED_SCRIPT} VERBATIM)
   target_sources(${target} PRIVATE ${output})
+  set_source_files_properties(${output} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
 endfunction()

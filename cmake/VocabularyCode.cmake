@@ -13,6 +13,7 @@ if(NOT CMAKE_SCRIPT_MODE_FILE)
       COMMAND ${CMAKE_COMMAND} -DINPUT=${file} -DOUTPUT=${output} -P ${NIDUS_VOCABULARY_SCRIPT}
       DEPENDS ${file} ${NIDUS_VOCABULARY_SCRIPT} VERBATIM)
     target_sources(${target} PRIVATE ${output})
+    set_source_files_properties(${output} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
   endfunction()
   return()
 endif()
