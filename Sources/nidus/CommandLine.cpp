@@ -12,6 +12,7 @@
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
 #include "nidus/StandardStreams.h"
+#include "nidus/SystemLibrary.h"
 #include "nidus/UnusedSyntax.h"
 #include "nidus/UsageErrors.h"
 #include "nidus/Workspace.h"
@@ -176,6 +177,8 @@ class CommandParser {
       return report({Failure::Kind::platform,
                      "there is not enough memory for this; give the program more of it, or less to "
                      "read"});
+    } catch (const MissingLibrary& missing) {
+      return report({Failure::Kind::platform, missing.what()});
     }
   }
 

@@ -10,7 +10,9 @@ namespace nidus {
 namespace {
 
 using testing::AllOf;
+using testing::AnyOf;
 using testing::Contains;
+using testing::Each;
 using testing::EndsWith;
 using testing::HasSubstr;
 using testing::IsEmpty;
@@ -68,6 +70,13 @@ TEST_P(HardeningTest, FindsLibrariesBesideItself) {
   EXPECT_EQ(paths.empty(), std::string_view(GetParam().label) == "library");
 }
 
+/// What only some commands need, those load themselves.
+TEST_P(HardeningTest, StartsWithoutRareLibraries) {
+  const auto libraries = elf_.dynamicTexts(DT_NEEDED);
+  EXPECT_THAT(libraries, Contains(StartsWith("libc.")));
+  EXPECT_THAT(libraries, Each(Not(AnyOf(StartsWith("libedit"), StartsWith("libunistring")))));
+}
+
 TEST_P(HardeningTest, GuardsItsStack) {
   EXPECT_THAT(elf_.importedSymbols(), Contains("__stack_chk_fail"));
 }
@@ -94,10 +103,10 @@ TEST_P(HardeningTest, HasOnlyUnitsThatWereBuiltSo) {
   std::erase_if(units, [](const std::string& text) { return !text.starts_with("GNU C++"); });
   ASSERT_THAT(units, Not(IsEmpty()));
   for (const char* option : {" -fstack-protector-strong", " -fstack-clash-protection"}) {
-    EXPECT_THAT(units, testing::Each(HasSubstr(option)));
+    EXPECT_THAT(units, Each(HasSubstr(option)));
   }
 #ifdef __x86_64__
-  EXPECT_THAT(units, testing::Each(HasSubstr(" -fcf-protection=full")));
+  EXPECT_THAT(units, Each(HasSubstr(" -fcf-protection=full")));
 #endif
 }
 #endif

@@ -5,13 +5,35 @@
 #include <unistd.h>
 #include <uniwidth.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <cstdlib>
+
+#include "nidus/SystemLibrary.h"
 
 namespace nidus {
 namespace {
 
 constexpr std::string_view kEllipsis = "…";
+constexpr std::size_t kEllipsisCells = 1;
+
+/// The functions of the library that knows all characters; most texts need none of them.
+struct CharacterLibrary {
+  const SystemLibrary library{NIDUS_UNISTRING_NAME};
+  decltype(&u8_width) width = library.function<decltype(u8_width)>("u8_width");
+  decltype(&u8_grapheme_breaks) graphemeBreaks =
+      library.function<decltype(u8_grapheme_breaks)>("u8_grapheme_breaks");
+};
+
+const CharacterLibrary& characterLibrary() {
+  static const CharacterLibrary kLibrary;
+  return kLibrary;
+}
+
+/// Whether each byte of `text` is a character that takes one cell.
+bool isPlain(std::string_view text) {
+  return std::all_of(text.begin(), text.end(), [](char c) { return c >= ' ' && c <= '~'; });
+}
 
 const std::uint8_t* unitsOf(std::string_view text) {
   return reinterpret_cast<const std::uint8_t*>(text.data());
@@ -52,8 +74,9 @@ std::string_view codeOf(Colour colour) {
 /// How many bytes of `text` are whole characters, with all that combines with them, and take at
 /// most `cells` cells.
 std::size_t fittingSize(std::string_view text, std::size_t cells) {
+  if (isPlain(text)) return std::min(text.size(), cells);
   std::vector<char> isStart(text.size());
-  u8_grapheme_breaks(unitsOf(text), text.size(), isStart.data());
+  characterLibrary().graphemeBreaks(unitsOf(text), text.size(), isStart.data());
   std::size_t fitting = 0;
   for (std::size_t end = 1; end < text.size(); ++end) {
     if (isStart[end] == 0) continue;
@@ -75,14 +98,15 @@ std::string coloured(std::string_view text, Colour colour, const TerminalStyle& 
 }
 
 std::size_t cellsOf(std::string_view text) {
-  const int cells = u8_width(unitsOf(text), text.size(), "UTF-8");
+  if (isPlain(text)) return text.size();
+  const int cells = characterLibrary().width(unitsOf(text), text.size(), "UTF-8");
   return cells > 0 ? static_cast<std::size_t>(cells) : 0;
 }
 
 std::string shortened(std::string_view text, std::size_t cells) {
   if (cellsOf(text) <= cells) return std::string(text);
   if (cells == 0) return {};
-  const std::string_view kept = text.substr(0, fittingSize(text, cells - cellsOf(kEllipsis)));
+  const std::string_view kept = text.substr(0, fittingSize(text, cells - kEllipsisCells));
   return std::string(kept.substr(0, kept.find_last_not_of(' ') + 1)).append(kEllipsis);
 }
 
