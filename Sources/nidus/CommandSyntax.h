@@ -50,6 +50,8 @@ class CommandSyntax {
   virtual void candidates(const std::string& name, std::vector<Candidates> ofWords) = 0;
   /// Leaves this command, which is for programs, out of the help and of completion.
   virtual void hide() = 0;
+  /// Whether anything asks for this command; what would be declared below it is forgotten if not.
+  [[nodiscard]] virtual bool isWanted() const { return true; }
   /// Sets what runs when this command is the one that was given.
   virtual void run(std::function<ExitStatus()> action) = 0;
 };

@@ -24,6 +24,7 @@ class UnusedSyntax final : public CommandSyntax {
                          const std::string&) override {}
   void candidates(const std::string&, std::vector<Candidates>) override {}
   void hide() override {}
+  [[nodiscard]] bool isWanted() const override { return false; }
   void run(std::function<ExitStatus()>) override {}
 };
 

@@ -10,6 +10,7 @@ void declareHome(CommandSyntax& program, Workspace& workspace) {
   CommandSyntax& home =
       program.command("home", "Shows, changes, reads and replaces the homes",
                       std::string("Example:\n  nidus home show") + kQuestionExitStatuses);
+  if (!home.isWanted()) return;
   declareHomeImport(home, workspace);
   declareHomeExport(home, workspace);
   declareHomeShow(home, workspace);

@@ -52,6 +52,7 @@ class OrderDeclaration {
   OrderDeclaration(CommandSyntax& program, Workspace& workspace, const std::string& verb,
                    const std::string& help, const std::string& details)
       : syntax_(program.command(verb, help, details + "\n\n" + kStatuses)) {
+    if (!syntax_.isWanted()) return;
     input_->words.verb = verb;
     declareFilterOptions(syntax_, input_->words.filter);
     syntax_.flag("--json", input_->isJson, "Print the replies themselves, one JSON line each");

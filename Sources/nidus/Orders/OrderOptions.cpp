@@ -23,14 +23,6 @@ void declareFilterOptions(CommandSyntax& syntax, OrderFilter& filter) {
                 "Objects of this kind: home, room, zone, group, service, scene or trigger; else "
                 "services");
   syntax.candidates("--entity", {{CandidateKind::entityTypes}});
-  syntax.candidates("--home", {{CandidateKind::homes}});
-  syntax.candidates("--room", {{CandidateKind::rooms}});
-  syntax.candidates("--zone", {{CandidateKind::zones}});
-  syntax.candidates("--group", {{CandidateKind::groups}});
-  syntax.candidates("--service", {{CandidateKind::services}});
-  syntax.candidates("--scene", {{CandidateKind::scenes}});
-  syntax.candidates("--type", {{CandidateKind::serviceTypes}});
-  syntax.candidates("--entity", {{CandidateKind::entityTypes}});
 }
 
 }  // namespace nidus
