@@ -14,28 +14,28 @@ struct Count {
   std::ptrdiff_t held = 0;
   std::ptrdiff_t peak = 0;
 };
-constinit thread_local Count count;
+constinit thread_local Count bytes;
 
 void* allocate(std::size_t size) noexcept {
   void* block = std::malloc(size == 0 ? 1 : size);
-  if (block && count.isOn) {
-    count.held += static_cast<std::ptrdiff_t>(malloc_usable_size(block));
-    count.peak = std::max(count.peak, count.held);
+  if (block && bytes.isOn) {
+    bytes.held += static_cast<std::ptrdiff_t>(malloc_usable_size(block));
+    bytes.peak = std::max(bytes.peak, bytes.held);
   }
   return block;
 }
 
 void release(void* block) noexcept {
-  if (block && count.isOn) count.held -= static_cast<std::ptrdiff_t>(malloc_usable_size(block));
+  if (block && bytes.isOn) bytes.held -= static_cast<std::ptrdiff_t>(malloc_usable_size(block));
   std::free(block);
 }
 
 }  // namespace
 
-CountedMemory::CountedMemory() { count = {true, 0, 0}; }
-CountedMemory::~CountedMemory() { count.isOn = false; }
-std::ptrdiff_t CountedMemory::peak() { return count.peak; }
-std::ptrdiff_t CountedMemory::held() { return count.held; }
+CountedMemory::CountedMemory() { bytes = {true, 0, 0}; }
+CountedMemory::~CountedMemory() { bytes.isOn = false; }
+std::ptrdiff_t CountedMemory::peak() { return bytes.peak; }
+std::ptrdiff_t CountedMemory::held() { return bytes.held; }
 
 }  // namespace nidus
 
