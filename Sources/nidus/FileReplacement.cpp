@@ -15,12 +15,6 @@
 namespace nidus {
 namespace {
 
-Failure writeFailure(const std::filesystem::path& file, int error) {
-  return {Failure::Kind::platform, file.string() + ": cannot be written (" +
-                                       std::generic_category().message(error) +
-                                       "); choose a writable place with room"};
-}
-
 /// An open file, closed at the end.
 class OpenFile {
  public:
@@ -39,7 +33,7 @@ class OpenFile {
 
 Status writeThrough(const std::filesystem::path& file, std::string_view text) {
   const OpenFile open(::open(file.c_str(), O_WRONLY | O_CLOEXEC));
-  if (!open.isOpen() || !writeWhole(open.number(), text)) return writeFailure(file, errno);
+  if (!open.isOpen() || !writeWhole(open.number(), text)) return unwritable(file, errno);
   return std::nullopt;
 }
 
@@ -56,14 +50,14 @@ Status replaceOrdinary(const std::filesystem::path& file, std::string_view text)
   const InterruptionHold hold;  // nothing is left beside the file
   std::string temporary = file.string() + ".XXXXXX";
   const OpenFile open(mkostemp(temporary.data(), O_CLOEXEC));
-  if (!open.isOpen()) return writeFailure(file, errno);
+  if (!open.isOpen()) return unwritable(file, errno);
   if (writeWhole(open.number(), text) && fchmod(open.number(), permissionsFor(file)) == 0 &&
       fsync(open.number()) == 0 && rename(temporary.c_str(), file.c_str()) == 0) {
     return std::nullopt;
   }
   const int error = errno;
   unlink(temporary.c_str());
-  return writeFailure(file, error);
+  return unwritable(file, error);
 }
 
 }  // namespace
@@ -72,10 +66,16 @@ Status replaceFile(const std::filesystem::path& file, std::string_view text) {
   namespace fs = std::filesystem;
   std::error_code error;
   const fs::file_status status = fs::status(file, error);
-  if (fs::is_directory(status)) return writeFailure(file, EISDIR);
+  if (fs::is_directory(status)) return unwritable(file, EISDIR);
   if (fs::exists(status) && !fs::is_regular_file(status)) return writeThrough(file, text);
   const fs::path target = fs::weakly_canonical(file, error);
   return replaceOrdinary(error ? file : target, text);
+}
+
+Failure unwritable(const std::filesystem::path& file, int error) {
+  return {Failure::Kind::platform, file.string() + ": cannot be written (" +
+                                       std::generic_category().message(error) +
+                                       "); choose a writable place with room"};
 }
 
 }  // namespace nidus

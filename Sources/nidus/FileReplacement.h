@@ -13,4 +13,8 @@ namespace nidus {
 /// failure, as the platform's, names the file.
 [[nodiscard]] Status replaceFile(const std::filesystem::path& file, std::string_view text);
 
+/// The failure, as the platform's, that `file` could not be written; `error` is the number of the
+/// reason.
+[[nodiscard]] Failure unwritable(const std::filesystem::path& file, int error);
+
 }  // namespace nidus

@@ -274,7 +274,11 @@ TEST_F(HomeEditTest, KeepsTheHomesWhenInterrupted) {
   TerminalProcess terminal(editing(kRename, false));
   ASSERT_TRUE(terminal.waitFor("Import this? [y/N] "));
   terminal.interrupt();
-  EXPECT_EQ(terminal.finish().signal, SIGINT);
+  const ProgramEnd end = terminal.finish();
+  EXPECT_EQ(end.signal, SIGINT);
+  EXPECT_THAT(end.output, HasSubstr("\nnidus: nothing was changed; what you edited is kept as " +
+                                    kept() + '\n'));
+  EXPECT_THAT(contentOfFile(kept()), HasSubstr("\"Den\""));
   EXPECT_EQ(exported(), before_);
 }
 

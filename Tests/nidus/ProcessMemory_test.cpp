@@ -91,8 +91,8 @@ TEST_F(ProcessMemoryTest, ReadsALargeHomeWithinItsBound) {
   expectBounded("export", start({"home", "export"}), home);
   expectBounded("check", start({"home", "check", home}), home);
   expectBounded("doctor", start({"doctor"}), home);
-  // What compares two documents, or answers for each service of the home, holds that as well.
-  peakOf("edit", edit, 0);
+  expectBounded("edit", edit, home);
+  // What answers for each service of the home holds the answers as well.
   peakOf("records", start({"records"}), 0);
   peakOf("read of all", start({"perform", get}), 0);
   peakOf("write of all", start({"perform", set}), 0);

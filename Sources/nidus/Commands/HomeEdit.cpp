@@ -1,13 +1,15 @@
 #include <algorithm>
+#include <cerrno>
+#include <fstream>
+#include <iterator>
 #include <memory>
 #include <optional>
-#include <sstream>
 #include <utility>
 
-#include "AssistantHost/InputFile.h"
 #include "HomePlatform/Store/HomeDocument.h"
 #include "nidus/CommandSyntax.h"
 #include "nidus/Commands/Commands.h"
+#include "nidus/Commands/HomeInput.h"
 #include "nidus/FileReplacement.h"
 #include "nidus/HomeEditing/HomeDifference.h"
 #include "nidus/HomeEditing/HomeMerge.h"
@@ -22,57 +24,60 @@
 namespace nidus {
 namespace {
 
-std::string documentOf(const std::vector<HomeData>& homes) {
-  std::ostringstream out;
+Status writeDocument(const std::filesystem::path& file, const std::vector<HomeData>& homes) {
+  std::ofstream out(file, std::ios::binary);
   writeHomeDocument(out, homes, true);
-  return out.str();
+  out.close();
+  return out ? Status() : unwritable(file, errno);
 }
 
-/// As much of the file as a document may have, and a byte more if it has more.
-std::string contentOf(const std::filesystem::path& file) {
-  auto in = openInput(file);
-  if (!in) return {};
-  auto content = readUpTo(kHomeDocumentLimits.documentBytes + 1, *in, file.string());
-  return content ? std::move(*content) : std::string();
+/// Whether two files are there and say the same.
+bool isSameContent(const std::filesystem::path& a, const std::filesystem::path& b) {
+  std::error_code error;
+  if (file_size(a, error) != file_size(b, error) || error) return false;
+  using Bytes = std::istreambuf_iterator<char>;
+  std::ifstream one(a, std::ios::binary);
+  std::ifstream other(b, std::ios::binary);
+  return std::equal(Bytes(one), Bytes(), Bytes(other), Bytes());
 }
 
-Result<std::vector<HomeData>> read(const std::string& document, const std::string& name) {
-  std::istringstream in(document);
-  return readHomeDocument(in, name);
-}
-
-/// One edit of the homes, from the document to the database.
+/// One edit of the homes, from the document to the database. Of a large home no document is held
+/// as a text: they are written to files, and compared there.
 class HomeEditor {
  public:
-  HomeEditor(HomePlatform& platform, TemporaryFolder folder, bool isConfirmed)
-      : platform_(platform), folder_(std::move(folder)), isConfirmed_(isConfirmed) {}
+  HomeEditor(HomePlatform& platform, TemporaryFolder folder, TemporaryFolder compared,
+             bool isConfirmed)
+      : platform_(platform),
+        folder_(std::move(folder)),
+        compared_(std::move(compared)),
+        isConfirmed_(isConfirmed) {}
 
   ExitStatus run() {
-    if (auto failure = writeDocument()) return report(*failure);
+    if (auto failure = writeDocuments()) return report(*failure);
+    // As it will be read again: a document tells less than the database in one or two places.
+    auto exported = readHomes(file_);
+    if (!exported) return report(exported.failure());
+    exported_ = std::move(*exported);
     for (;;) {
       if (auto failure = editInForeground(file_)) return giveUp(*failure);
-      const std::string text = contentOf(file_);
-      if (text == before_) return sayUnchanged();
-      auto edited = read(text, file_.string());
+      if (isSameContent(file_, before_)) return sayUnchanged();
+      auto edited = readHomes(file_);
       if (edited) return finish(std::move(*edited));
       if (!canAsk()) return giveUp(edited.failure());
       reportLine(edited.failure().message);
-      if (!ask("Edit it again?", EmptyAnswer::yes)) {
+      if (!ask("Edit it again?", EmptyAnswer::yes, unchanged_)) {
         return giveUp({Failure::Kind::badInput, "nothing was changed"});
       }
     }
   }
 
  private:
-  [[nodiscard]] Status writeDocument() {
+  /// Writes the homes as they are, once to be edited and once to be compared.
+  [[nodiscard]] Status writeDocuments() const {
     const auto homes = platform_.exportHomes();
     if (!homes) return homes.failure();
-    before_ = documentOf(*homes);
-    // As it will be read again: a document tells less than the database in one or two places.
-    auto exported = read(before_, file_.string());
-    if (!exported) return exported.failure();
-    exported_ = std::move(*exported);
-    if (auto failure = replaceFile(file_, before_)) return failure;
+    if (auto failure = writeDocument(before_, *homes)) return failure;
+    if (auto failure = writeDocument(file_, *homes)) return failure;
     std::error_code error;
     std::filesystem::permissions(file_, std::filesystem::perms(0600), error);
     return std::nullopt;
@@ -82,18 +87,18 @@ class HomeEditor {
 
   /// Shows what the person did to the document, and imports it.
   ExitStatus finish(std::vector<HomeData> edited) {
-    const std::string after = documentOf(edited);
-    if (after == before_) return sayUnchanged();
+    if (auto failure = writeDocument(after_, edited)) return giveUp(*failure);
+    if (isSameContent(after_, before_)) return sayUnchanged();
     const std::string summary = summaryOf(edited);
-    if (auto failure = showDifference(after)) return giveUp(*failure);
+    showDifference();
     if (auto failure = writeOutput(summary + '\n')) return giveUp(*failure);
-    if (!isConfirmed_ && !ask("Import this?")) {
-      return std::max(ExitStatus::otherOutcome, sayKept("nothing was changed; "));
+    if (!isConfirmed_ && !ask("Import this?", EmptyAnswer::no, unchanged_)) {
+      return std::max(ExitStatus::otherOutcome, sayKept());
     }
     std::optional<InterruptionHold> hold;
     const auto failure = platform_.editHomes([&](std::vector<HomeData>& homes) {
       hold.emplace();  // until the change is lasting and the preferences suit it
-      auto merged = mergeEdit(exported_, std::move(edited), homes);
+      auto merged = mergeEdit(std::move(exported_), std::move(edited), std::move(homes));
       if (!merged) return Status(merged.failure());
       homes = std::move(*merged);
       return Status();
@@ -108,39 +113,36 @@ class HomeEditor {
 
   /// Has the two documents compared line by line; without a program that can, the summary has to
   /// do.
-  [[nodiscard]] Status showDifference(const std::string& after) const {
-    const auto was = folder_.path() / "before.json";
-    const auto is = folder_.path() / "after.json";
-    if (auto failure = replaceFile(was, before_)) return failure;
-    if (auto failure = replaceFile(is, after)) return failure;
+  void showDifference() {
     static_cast<void>(runInForeground({"diff", "-u", "--label", "homes as they are", "--label",
-                                       "homes as edited", was.string(), is.string()}));
-    std::error_code ignored;
-    std::filesystem::remove(was, ignored);
-    std::filesystem::remove(is, ignored);
-    return std::nullopt;
+                                       "homes as edited", before_.string(), after_.string()}));
+    compared_.reset();
   }
 
   /// Ends without a change; what the person wrote is kept, if it is anything.
   ExitStatus giveUp(const Failure& failure) {
-    const std::string text = contentOf(file_);
-    if (text.empty() || text == before_) return report(failure);
+    std::error_code error;
+    const auto size = file_size(file_, error);
+    if (error || size == 0 || isSameContent(file_, before_)) return report(failure);
     folder_.keep();
-    return report(
-        {failure.kind, failure.message + "; what you edited is kept as " + file_.string()});
+    return report({failure.kind, failure.message + "; " + kept_});
   }
 
-  ExitStatus sayKept(const std::string& outcome) {
+  ExitStatus sayKept() {
     folder_.keep();
-    return printText(outcome + "what you edited is kept as " + file_.string() + '\n');
+    return printText(unchanged_ + '\n');
   }
 
   HomePlatform& platform_;
   TemporaryFolder folder_;
+  std::optional<TemporaryFolder> compared_;  ///< Gone once the difference was shown.
   const bool isConfirmed_;
   const std::filesystem::path file_ = folder_.path() / "homes.json";
-  std::string before_;              ///< The document as it was exported.
-  std::vector<HomeData> exported_;  ///< What it says.
+  const std::filesystem::path before_ = compared_->path() / "before.json";  ///< As it was exported.
+  const std::filesystem::path after_ = compared_->path() / "after.json";    ///< As it was edited.
+  const std::string kept_ = "what you edited is kept as " + file_.string();
+  const std::string unchanged_ = "nothing was changed; " + kept_;
+  std::vector<HomeData> exported_;  ///< What the document said.
 };
 
 ExitStatus editHomes(bool isConfirmed, Workspace& workspace) {
@@ -152,7 +154,10 @@ ExitStatus editHomes(bool isConfirmed, Workspace& workspace) {
   if (!session) return report(session.failure());
   auto folder = TemporaryFolder::make();
   if (!folder) return report(folder.failure());
-  return HomeEditor((*session)->platform(), std::move(*folder), isConfirmed).run();
+  auto compared = TemporaryFolder::make();
+  if (!compared) return report(compared.failure());
+  return HomeEditor((*session)->platform(), std::move(*folder), std::move(*compared), isConfirmed)
+      .run();
 }
 
 }  // namespace

@@ -1,95 +1,62 @@
 #include "nidus/HomeEditing/HomeDifference.h"
 
+#include <algorithm>
 #include <map>
-#include <sstream>
+#include <optional>
 #include <utility>
 
-#include "HomePlatform/Store/HomeDocument.h"
+#include "HomePlatform/Store/ValueConversion.h"
 #include "nidus/HomeEditing/HomeObjects.h"
+#include "nidus/ObjectPairs.h"
 
 namespace nidus {
 namespace {
 
-/// What is compared of one object.
-struct Object {
-  NDString name;
-  std::string content;  ///< What it says beside its name and the objects in it.
-};
-
-/// Objects by what tells them apart from all others of their kind.
-using Objects = std::map<std::string, Object>;
-using ObjectsByKind = std::map<ObjectKind, Objects>;
-
-/// The document of a home that has nothing but the object to be compared.
-std::string contentOf(HomeData home) {
-  home.uuid = NDUUID();
-  home.name = "";
-  std::ostringstream out;
-  writeHomeDocument(out, {home}, false);
-  return out.str();
+bool isSame(const std::optional<MetadataData>& a, const std::optional<MetadataData>& b) {
+  if (!a || !b) return !a && !b;
+  return a->format == b->format && a->units == b->units &&
+         isSameValue(a->minimumValue, b->minimumValue) &&
+         isSameValue(a->maximumValue, b->maximumValue) && isSameValue(a->stepValue, b->stepValue);
 }
 
-std::string text(const NDUUID& uuid) { return uuid.UUIDString().str() + '/'; }
+bool isSame(const CharacteristicData& a, const CharacteristicData& b) {
+  return a.instanceID == b.instanceID && a.characteristicType == b.characteristicType &&
+         a.properties == b.properties && isSameValue(a.value, b.value) &&
+         isSameValue(a.deviceValue, b.deviceValue) && isSame(a.metadata, b.metadata) &&
+         a.faults == b.faults;
+}
 
-/// Lists all objects of an edition.
-class Listing {
- public:
-  explicit Listing(const std::vector<HomeData>& homes) {
-    for (const HomeData& home : homes) addHome(home);
-  }
-  [[nodiscard]] ObjectsByKind take() { return std::move(objects_); }
+bool isSame(const SceneActionData& a, const SceneActionData& b) {
+  return a.target == b.target && isSameValue(a.value, b.value);
+}
 
- private:
-  void addHome(const HomeData& home) {
-    HomeData own;
-    own.primary = home.primary;
-    own.faults = home.faults;
-    add(ObjectKind::home, text(home.uuid), home.name, std::move(own));
-    addAll(ObjectKind::room, home, &HomeData::rooms);
-    addAll(ObjectKind::zone, home, &HomeData::zones);
-    for (const AccessoryData& accessory : home.accessories) {
-      addServices(accessory, text(home.uuid) + text(accessory.uuid));
-      AccessoryData bare = accessory;
-      bare.services.clear();
-      addOne(ObjectKind::accessory, home, &HomeData::accessories, std::move(bare));
-    }
-    addAll(ObjectKind::group, home, &HomeData::serviceGroups);
-    addAll(ObjectKind::scene, home, &HomeData::actionSets);
-    addAll(ObjectKind::trigger, home, &HomeData::triggers);
-  }
+template <class Part>
+bool areSame(const std::vector<Part>& a, const std::vector<Part>& b) {
+  return std::equal(a.begin(), a.end(), b.begin(), b.end(),
+                    [](const Part& one, const Part& other) { return isSame(one, other); });
+}
 
-  template <class Data>
-  void addAll(ObjectKind kind, const HomeData& home, std::vector<Data> HomeData::*list) {
-    for (const Data& data : home.*list) addOne(kind, home, list, data);
-  }
-
-  template <class Data>
-  void addOne(ObjectKind kind, const HomeData& home, std::vector<Data> HomeData::*list, Data data) {
-    const std::string identity = text(home.uuid) + text(data.uuid);
-    const NDString name = std::exchange(data.name, "");
-    HomeData own;
-    (own.*list).push_back(std::move(data));
-    add(kind, identity, name, std::move(own));
-  }
-
-  void addServices(const AccessoryData& accessory, const std::string& identity) {
-    for (const ServiceData& service : accessory.services) {
-      HomeData own;
-      own.accessories.resize(1);
-      own.accessories[0].name = "";
-      own.accessories[0].services = {service};
-      own.accessories[0].services[0].name = "";
-      add(ObjectKind::service, identity + std::to_string(service.instanceID), service.name,
-          std::move(own));
-    }
-  }
-
-  void add(ObjectKind kind, const std::string& identity, const NDString& name, HomeData own) {
-    objects_[kind][identity] = {name, contentOf(std::move(own))};
-  }
-
-  ObjectsByKind objects_;
-};
+/// Whether two states of an object say the same beside its name and the objects in it.
+bool isSameBeside(const HomeData& a, const HomeData& b) {
+  return a.primary == b.primary && a.faults == b.faults;
+}
+bool isSameBeside(const RoomData& /*a*/, const RoomData& /*b*/) { return true; }
+bool isSameBeside(const ZoneData& a, const ZoneData& b) { return a.rooms == b.rooms; }
+bool isSameBeside(const AccessoryData& a, const AccessoryData& b) {
+  return a.room == b.room && a.reachable == b.reachable && a.requiresUnlock == b.requiresUnlock &&
+         a.faults == b.faults;
+}
+bool isSameBeside(const ServiceData& a, const ServiceData& b) {
+  return a.serviceType == b.serviceType && a.associatedServiceType == b.associatedServiceType &&
+         areSame(a.characteristics, b.characteristics);
+}
+bool isSameBeside(const ServiceGroupData& a, const ServiceGroupData& b) {
+  return a.services == b.services;
+}
+bool isSameBeside(const ActionSetData& a, const ActionSetData& b) {
+  return areSame(a.actions, b.actions) && a.executeFault == b.executeFault;
+}
+bool isSameBeside(const TriggerData& /*a*/, const TriggerData& /*b*/) { return true; }
 
 /// How many objects of one kind differ, and in what.
 struct Count {
@@ -99,41 +66,89 @@ struct Count {
   std::size_t changed = 0;
 };
 
-Count compare(const Objects& before, const Objects& after) {
-  Count count;
-  for (const auto& [identity, object] : after) {
-    const auto old = before.find(identity);
-    if (old == before.end()) {
-      ++count.added;
-      continue;
+/// Compares two editions of the homes.
+class EditionComparison {
+ public:
+  EditionComparison(const std::vector<HomeData>& before, const std::vector<HomeData>& after) {
+    compareLists(ObjectKind::home, before, after);
+  }
+
+  /// The counts of all that differs.
+  [[nodiscard]] std::string text() const {
+    std::string text;
+    for (const auto& [kind, count] : counts_) {
+      const std::pair<std::size_t, const char*> parts[] = {{count.added, " added"},
+                                                           {count.removed, " removed"},
+                                                           {count.renamed, " renamed"},
+                                                           {count.changed, " changed"}};
+      for (const auto& [number, verb] : parts) {
+        if (number > 0) text += (text.empty() ? "" : ", ") + counted(number, kind) + verb;
+      }
     }
-    if (!(old->second.name == object.name)) ++count.renamed;
-    if (old->second.content != object.content) ++count.changed;
+    return text;
   }
-  for (const auto& entry : before) {
-    if (after.count(entry.first) == 0) ++count.removed;
+  [[nodiscard]] bool isOrderSame() const { return isOrderSame_; }
+
+ private:
+  template <class Object>
+  void compareLists(ObjectKind kind, const std::vector<Object>& before,
+                    const std::vector<Object>& after) {
+    forEachPair(before, after, [this, kind](const Object* old, const Object* now) {
+      compare(kind, old, now);
+      compareParts(old, now);
+    });
+    isOrderSame_ = isOrderSame_ && std::equal(before.begin(), before.end(), after.begin(),
+                                              after.end(), [](const Object& a, const Object& b) {
+                                                return keyOf(a) == keyOf(b);
+                                              });
   }
-  return count;
-}
+
+  template <class Object>
+  void compare(ObjectKind kind, const Object* old, const Object* now) {
+    Count& count = counts_[kind];
+    if (!old) ++count.added;
+    if (!now) ++count.removed;
+    if (!old || !now) return;
+    if (!(old->name == now->name)) ++count.renamed;
+    if (!isSameBeside(*old, *now)) ++count.changed;
+  }
+
+  void compareParts(const HomeData* old, const HomeData* now) {
+    compareParts(ObjectKind::room, old, now, &HomeData::rooms);
+    compareParts(ObjectKind::zone, old, now, &HomeData::zones);
+    compareParts(ObjectKind::accessory, old, now, &HomeData::accessories);
+    compareParts(ObjectKind::group, old, now, &HomeData::serviceGroups);
+    compareParts(ObjectKind::scene, old, now, &HomeData::actionSets);
+    compareParts(ObjectKind::trigger, old, now, &HomeData::triggers);
+  }
+  void compareParts(const AccessoryData* old, const AccessoryData* now) {
+    compareParts(ObjectKind::service, old, now, &AccessoryData::services);
+  }
+  /// All others have none.
+  void compareParts(const void* /*old*/, const void* /*now*/) {}
+
+  /// The parts of one kind; an object that is not there has none.
+  template <class Owner, class Object>
+  void compareParts(ObjectKind kind, const Owner* old, const Owner* now,
+                    std::vector<Object> Owner::*list) {
+    const std::vector<Object> none;
+    compareLists(kind, old ? old->*list : none, now ? now->*list : none);
+  }
+
+  std::map<ObjectKind, Count> counts_;  ///< In the order in which they are told.
+  bool isOrderSame_ = true;
+};
 
 }  // namespace
 
 std::string differenceText(const std::vector<HomeData>& before,
                            const std::vector<HomeData>& after) {
-  ObjectsByKind old = Listing(before).take();
-  ObjectsByKind now = Listing(after).take();
-  std::string text;
-  for (const ObjectKind kind : kObjectKinds) {
-    const Count count = compare(old[kind], now[kind]);
-    const std::pair<std::size_t, const char*> parts[] = {{count.added, " added"},
-                                                         {count.removed, " removed"},
-                                                         {count.renamed, " renamed"},
-                                                         {count.changed, " changed"}};
-    for (const auto& [number, verb] : parts) {
-      if (number > 0) text += (text.empty() ? "" : ", ") + counted(number, kind) + verb;
-    }
-  }
-  return text;
+  return EditionComparison(before, after).text();
+}
+
+bool isSame(const std::vector<HomeData>& before, const std::vector<HomeData>& after) {
+  const EditionComparison comparison(before, after);
+  return comparison.isOrderSame() && comparison.text().empty();
 }
 
 }  // namespace nidus

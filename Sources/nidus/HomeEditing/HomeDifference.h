@@ -13,4 +13,7 @@ namespace nidus {
 [[nodiscard]] std::string differenceText(const std::vector<HomeData>& before,
                                          const std::vector<HomeData>& after);
 
+/// Whether two editions of the homes say the same, in the same order.
+[[nodiscard]] bool isSame(const std::vector<HomeData>& before, const std::vector<HomeData>& after);
+
 }  // namespace nidus

@@ -1,59 +1,69 @@
 #include "nidus/HomeEditing/HomeMerge.h"
 
+#include <cstddef>
 #include <map>
-#include <sstream>
 #include <string>
 #include <utility>
 
-#include "HomePlatform/Store/HomeDocument.h"
 #include "HomePlatform/Store/ValueConversion.h"
 #include "nidus/HomeEditing/HomeDifference.h"
 
 namespace nidus {
 namespace {
 
-/// Calls `visit` for each characteristic with its home's UUID and its address.
-template <class Homes, class Visit>
-void forEachCharacteristic(Homes& homes, const Visit& visit) {
-  for (auto& home : homes) {
-    for (auto& accessory : home.accessories) {
-      for (auto& service : accessory.services) {
-        for (auto& characteristic : service.characteristics) {
+/// A characteristic's address within all homes.
+using CharacteristicPlace = std::pair<NDUUID, CharacteristicAddress>;
+
+/// Calls `visit` for each characteristic, in order.
+template <class Visit>
+void forEachCharacteristic(std::vector<HomeData>& homes, const Visit& visit) {
+  for (HomeData& home : homes) {
+    for (AccessoryData& accessory : home.accessories) {
+      for (ServiceData& service : accessory.services) {
+        for (CharacteristicData& data : service.characteristics) {
           visit(
-              home.uuid,
-              CharacteristicAddress{accessory.uuid, service.instanceID, characteristic.instanceID},
-              characteristic);
+              CharacteristicPlace(home.uuid, {accessory.uuid, service.instanceID, data.instanceID}),
+              data);
         }
       }
     }
   }
 }
 
-std::vector<HomeData> withoutValues(std::vector<HomeData> homes) {
-  forEachCharacteristic(
-      homes, [](const NDUUID&, const CharacteristicAddress&, CharacteristicData& characteristic) {
-        characteristic.value = nullptr;
-        characteristic.deviceValue = nullptr;
-      });
-  return homes;
-}
+struct Values {
+  NDValueRef value;
+  NDValueRef deviceValue;
+};
 
-std::string documentOf(const std::vector<HomeData>& homes) {
-  std::ostringstream out;
-  writeHomeDocument(out, homes, false);
-  return out.str();
-}
-
-using Place = std::pair<NDUUID, CharacteristicAddress>;
-using Characteristics = std::map<Place, const CharacteristicData*>;
-
-Characteristics characteristicsOf(const std::vector<HomeData>& homes) {
-  Characteristics all;
-  forEachCharacteristic(homes, [&all](const NDUUID& home, const CharacteristicAddress& address,
-                                      const CharacteristicData& characteristic) {
-    all.emplace(Place(home, address), &characteristic);
+/// Takes the values out of the homes, in the order of their characteristics.
+std::vector<Values> takeValues(std::vector<HomeData>& homes) {
+  std::vector<Values> values;
+  forEachCharacteristic(homes, [&values](const CharacteristicPlace&, CharacteristicData& data) {
+    values.push_back(
+        {std::exchange(data.value, nullptr), std::exchange(data.deviceValue, nullptr)});
   });
-  return all;
+  return values;
+}
+
+/// What became of the values of a characteristic while a person edited the homes.
+struct ValuesChange {
+  Values before;
+  Values now;
+};
+using ValuesChanges = std::map<CharacteristicPlace, ValuesChange>;
+
+/// The values of `homes` that differ; both lists are in the order of the characteristics.
+ValuesChanges changesBetween(const std::vector<Values>& before, const std::vector<Values>& now,
+                             std::vector<HomeData>& homes) {
+  ValuesChanges changes;
+  std::size_t i = 0;
+  forEachCharacteristic(homes, [&](const CharacteristicPlace& place, const CharacteristicData&) {
+    const bool isSame = isSameValue(before[i].value, now[i].value) &&
+                        isSameValue(before[i].deviceValue, now[i].deviceValue);
+    if (!isSame) changes.emplace(place, ValuesChange{before[i], now[i]});
+    ++i;
+  });
+  return changes;
 }
 
 /// The value that is to be: the current one where the person left the exported one alone, be it in
@@ -68,30 +78,28 @@ NDValueRef mergedValue(const NDValueRef& exported, const NDValueRef& edited,
 
 }  // namespace
 
-Result<std::vector<HomeData>> mergeEdit(const std::vector<HomeData>& exported,
+Result<std::vector<HomeData>> mergeEdit(std::vector<HomeData> exported,
                                         std::vector<HomeData> edited,
-                                        const std::vector<HomeData>& current) {
-  const auto before = withoutValues(exported);
-  const auto now = withoutValues(current);
-  if (documentOf(before) != documentOf(now)) {
-    const std::string difference = differenceText(before, now);
+                                        std::vector<HomeData> current) {
+  const auto before = takeValues(exported);
+  const auto now = takeValues(current);
+  if (!isSame(exported, current)) {
+    const std::string difference = differenceText(exported, current);
     return Failure{Failure::Kind::badInput,
                    "the homes were changed meanwhile (" +
                        (difference.empty() ? "in another order" : difference) +
                        "); edit them again as they are now"};
   }
-  const Characteristics old = characteristicsOf(exported);
-  const Characteristics present = characteristicsOf(current);
-  forEachCharacteristic(edited, [&](const NDUUID& home, const CharacteristicAddress& address,
-                                    CharacteristicData& data) {
-    const auto was = old.find({home, address});
-    if (was == old.end()) return;
-    const CharacteristicData& is = *present.at({home, address});
-    const NDString format = data.metadata ? data.metadata->format : NDString();
-    data.value = mergedValue(was->second->value, data.value, is.value, format);
-    data.deviceValue =
-        mergedValue(was->second->deviceValue, data.deviceValue, is.deviceValue, format);
-  });
+  const ValuesChanges changes = changesBetween(before, now, current);
+  forEachCharacteristic(
+      edited, [&changes](const CharacteristicPlace& place, CharacteristicData& data) {
+        const auto found = changes.find(place);
+        if (found == changes.end()) return;
+        const auto& [was, is] = found->second;
+        const NDString format = data.metadata ? data.metadata->format : NDString();
+        data.value = mergedValue(was.value, data.value, is.value, format);
+        data.deviceValue = mergedValue(was.deviceValue, data.deviceValue, is.deviceValue, format);
+      });
   return edited;
 }
 

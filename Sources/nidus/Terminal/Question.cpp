@@ -6,6 +6,7 @@
 #include <cerrno>
 #include <csignal>
 #include <optional>
+#include <string_view>
 
 #include "HomePlatform/System/OneLine.h"
 #include "nidus/StandardStreams.h"
@@ -13,18 +14,25 @@
 namespace nidus {
 namespace {
 
-struct sigaction interruptBefore = {};  // for a handler, which sees nothing else
+// For a handler, which sees nothing else.
+struct sigaction interruptBefore = {};
+std::string_view wordsAtTheEnd;
 
 void endLineAndInterrupt(int signal) {
   static_cast<void>(writeWhole(STDERR_FILENO, "\n"));
+  if (interruptBefore.sa_handler == SIG_DFL) {
+    static_cast<void>(writeWhole(STDERR_FILENO, wordsAtTheEnd));
+  }
   sigaction(signal, &interruptBefore, nullptr);
   raise(signal);
 }
 
-/// While it lives, an interrupt ends the line of the question before it does what it did before.
+/// While it lives, an interrupt ends the line of the question, and says the last words if it ends
+/// the program, before it does what it did before.
 class LineEndOnInterrupt {
  public:
-  LineEndOnInterrupt() {
+  explicit LineEndOnInterrupt(std::string_view lastWords) {
+    wordsAtTheEnd = lastWords;
     struct sigaction ending = {};
     ending.sa_handler = endLineAndInterrupt;
     sigaction(SIGINT, nullptr, &interruptBefore);
@@ -53,9 +61,10 @@ std::optional<std::string> readAnswer() {
 
 bool canAsk() { return isatty(STDIN_FILENO) == 1 && isatty(STDERR_FILENO) == 1; }
 
-bool ask(const std::string& question, EmptyAnswer empty) {
+bool ask(const std::string& question, EmptyAnswer empty, const std::string& lastWords) {
   const std::string choice = empty == EmptyAnswer::yes ? " [Y/n] " : " [y/N] ";
-  const LineEndOnInterrupt lineEnd;
+  const std::string lastLine = lastWords.empty() ? "" : "nidus: " + lastWords + '\n';
+  const LineEndOnInterrupt lineEnd(lastLine);
   if (!writeWhole(STDERR_FILENO, onOneLine(question) + choice)) return false;
   const auto answer = readAnswer();
   if (!answer) {

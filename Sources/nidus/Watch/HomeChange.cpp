@@ -1,9 +1,9 @@
 #include "nidus/Watch/HomeChange.h"
 
-#include <unordered_map>
 #include <utility>
 
 #include "nidus/AttributeText.h"
+#include "nidus/ObjectPairs.h"
 #include "nidus/ObjectPath.h"
 
 namespace nidus {
@@ -34,29 +34,6 @@ NDDictionary dictionaryOf(const NDString& text) {
 }
 
 bool isSame(const NDValueRef& a, const NDValueRef& b) { return a && b ? a->isEqual(*b) : !a && !b; }
-
-NDUUID keyOf(const HomeData& home) { return home.uuid; }
-NDUUID keyOf(const RoomData& room) { return room.uuid; }
-NDUUID keyOf(const AccessoryData& accessory) { return accessory.uuid; }
-std::int64_t keyOf(const ServiceData& service) { return service.instanceID; }
-std::int64_t keyOf(const CharacteristicData& characteristic) { return characteristic.instanceID; }
-
-/// Calls `visit` with each object of two lists: with both of its states, or with null for the one
-/// that it does not have.
-template <class Object, class Visit>
-void forEachPair(const std::vector<Object>& before, const std::vector<Object>& after,
-                 const Visit& visit) {
-  std::unordered_map<decltype(keyOf(before.front())), const Object*> earlier;
-  for (const Object& object : before) earlier.emplace(keyOf(object), &object);
-  for (const Object& object : after) {
-    const auto found = earlier.find(keyOf(object));
-    visit(found == earlier.end() ? nullptr : found->second, &object);
-    if (found != earlier.end()) earlier.erase(found);
-  }
-  for (const Object& object : before) {
-    if (earlier.count(keyOf(object)) > 0) visit(&object, nullptr);
-  }
-}
 
 NDString shownName(const ServiceData& service) {
   return service.name ? service.name : NDString("(no name)");

@@ -39,6 +39,12 @@ TEST(DifferenceTextTest, CountsWhatWasDone) {
        [](auto& homes) {
          homes[0].accessories[0].services[0].characteristics[0].value = NDValue::boolean(false);
        }},
+      {"1 service changed",
+       [](auto& homes) {
+         homes[0].accessories[0].services[0].characteristics[0].metadata->units = "percentage";
+       }},
+      {"1 scene changed",
+       [](auto& homes) { homes[0].actionSets[0].actions[0].value = NDValue::integer(1); }},
       {"1 accessory removed, 2 services removed, 1 scene changed",
        [](auto& homes) {
          ASSERT_TRUE(removeObject(homes, {ObjectKind::accessory, "Floor lamp", ""}));
@@ -60,6 +66,16 @@ TEST(DifferenceTextTest, TellsObjectsOfOneUUIDApartByHome) {
   auto homes = sampleHomes();
   homes[1].rooms[0].uuid = homes[0].rooms[0].uuid;
   EXPECT_EQ(differenceText(sampleHomes(), homes), "1 room added, 1 room removed");
+}
+
+TEST(IsSameHomesTest, TellsOrderAndValuesApart) {
+  EXPECT_TRUE(isSame(sampleHomes(), sampleHomes()));
+  auto homes = sampleHomes();
+  std::swap(homes[0].rooms[0], homes[0].rooms[1]);
+  EXPECT_FALSE(isSame(sampleHomes(), homes));
+  homes = sampleHomes();
+  homes[0].accessories[0].services[0].characteristics[1].deviceValue = nullptr;
+  EXPECT_FALSE(isSame(sampleHomes(), homes));
 }
 
 }  // namespace
