@@ -8,6 +8,8 @@
 #include <cstring>
 #include <limits>
 
+#include "PlatformModel/System/NDTextMatching.h"
+
 namespace nidus {
 namespace {
 
@@ -17,6 +19,7 @@ DatabaseError::Kind kindOf(int code) {
     case SQLITE_LOCKED:
       return DatabaseError::Kind::locked;
     case SQLITE_CORRUPT:
+    case SQLITE_INTERRUPT:  // by the limit of work alone
       return DatabaseError::Kind::damaged;
     case SQLITE_NOTADB:
       return DatabaseError::Kind::notADatabase;
@@ -110,6 +113,9 @@ void Database::check(int code) const {
 }
 
 void Database::fail(int code) const {
+  if (code == SQLITE_INTERRUPT) {
+    throw DatabaseError{kindOf(code), "its pages lead to one another again and again"};
+  }
   throw DatabaseError{kindOf(code),
                       connection_ ? sqlite3_errmsg(connection_) : sqlite3_errstr(code)};
 }
@@ -203,8 +209,10 @@ bool Statement::isNull(int column) const {
 std::string_view Statement::text(int column) const {
   const auto* characters = sqlite3_column_text(statement_, column);
   if (!characters) return {};
-  return {reinterpret_cast<const char*>(characters),
-          static_cast<std::size_t>(sqlite3_column_bytes(statement_, column))};
+  const std::string_view text(reinterpret_cast<const char*>(characters),
+                              static_cast<std::size_t>(sqlite3_column_bytes(statement_, column)));
+  if (!isUTF8(text)) failDamaged(column);
+  return text;
 }
 
 NDUUID Statement::uuid(int column) const {
@@ -243,6 +251,26 @@ void Statement::failDamaged(int column) const {
   throw DatabaseError{DatabaseError::Kind::damaged, std::string("unexpected contents of column ") +
                                                         sqlite3_column_name(statement_, column)};
 }
+
+WorkLimit::WorkLimit(Database& database) : database_(database) {
+  // Reading and examining the densest tables that a home document can fill takes half a step for a
+  // byte of the database.
+  constexpr std::int64_t kStepsOfByte = 2;
+  constexpr std::int64_t kStepsOfNothing = 1'000'000;
+  constexpr int kStepsAtOnce = 1000;
+  stepsLeft_ = kStepsOfNothing + kStepsOfByte * database.number("PRAGMA page_count") *
+                                     database.number("PRAGMA page_size");
+  sqlite3_progress_handler(
+      database.connection_, kStepsAtOnce,
+      [](void* stepsLeft) {
+        auto& left = *static_cast<std::int64_t*>(stepsLeft);
+        left -= kStepsAtOnce;
+        return left < 0 ? 1 : 0;
+      },
+      &stepsLeft_);
+}
+
+WorkLimit::~WorkLimit() { sqlite3_progress_handler(database_.connection_, 0, nullptr, nullptr); }
 
 Transaction::Transaction(Database& database, Kind kind) : database_(database) {
   database_.run(kind == Kind::writing ? "BEGIN IMMEDIATE" : "BEGIN");

@@ -65,6 +65,7 @@ class Database {
 
  private:
   friend class Statement;
+  friend class WorkLimit;
   void configure(std::chrono::milliseconds lockTimeout);
   void limitSizes();
   void check(int code) const;
@@ -115,7 +116,7 @@ class Statement {
   [[nodiscard]] std::int32_t smallInteger(int column) const;
   [[nodiscard]] bool flag(int column) const { return integer(column) != 0; }
   [[nodiscard]] bool isNull(int column) const;
-  /// Empty for null. Valid until the next step.
+  /// Empty for null. Valid until the next step. What is not UTF-8 counts as damage.
   [[nodiscard]] std::string_view text(int column) const;
   [[nodiscard]] NDUUID uuid(int column) const;
   [[nodiscard]] NDValueRef value(int column) const;
@@ -126,6 +127,21 @@ class Statement {
 
   Database& database_;
   sqlite3_stmt* statement_ = nullptr;
+};
+
+/// While it lives, statements that take far more steps than all that a sound database of this size
+/// holds can ask for fail, as for a damaged one: pages that lead to one another again and again
+/// could otherwise be read without end. One at a time for a database, which must outlive it.
+class WorkLimit {
+ public:
+  explicit WorkLimit(Database& database);
+  ~WorkLimit();
+  WorkLimit(const WorkLimit&) = delete;
+  WorkLimit& operator=(const WorkLimit&) = delete;
+
+ private:
+  Database& database_;
+  std::int64_t stepsLeft_;
 };
 
 /// A change that is made whole or not at all: undone with this object unless committed.

@@ -239,7 +239,10 @@ class HomeLoader {
 
 }  // namespace
 
-std::vector<HomeData> loadHomesFrom(Database& database) { return HomeLoader(database).load(); }
+std::vector<HomeData> loadHomesFrom(Database& database) {
+  const WorkLimit limit(database);
+  return HomeLoader(database).load();
+}
 
 std::vector<HomeData> loadMigratedHomes(Database& database) {
   const bool isCurrent = isSchemaCurrent(database, schemaSteps());

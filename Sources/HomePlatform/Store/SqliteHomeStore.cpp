@@ -30,8 +30,10 @@ Result<std::vector<HomeData>> SqliteHomeStore::loadHomes() {
 }
 
 Result<std::int64_t> SqliteHomeStore::countHomes() {
-  return load<std::int64_t>(
-      [](Database& database) { return database.number("SELECT count(*) FROM home"); });
+  return load<std::int64_t>([](Database& database) {
+    const WorkLimit limit(database);
+    return database.number("SELECT count(*) FROM home");
+  });
 }
 
 }  // namespace nidus

@@ -24,6 +24,7 @@ std::string joinedLines(std::string_view report) {
 }
 
 void checkPages(Database& database, std::vector<DatabaseError>& found) {
+  const WorkLimit limit(database);
   Statement page(database, "PRAGMA integrity_check(10)");
   while (page.step()) {
     if (page.text(0) != "ok") found.push_back({kDamaged, joinedLines(page.text(0))});
@@ -31,6 +32,7 @@ void checkPages(Database& database, std::vector<DatabaseError>& found) {
 }
 
 void checkReferences(Database& database, std::vector<DatabaseError>& found) {
+  const WorkLimit limit(database);
   Statement table(database,
                   "SELECT \"table\", count(*) FROM pragma_foreign_key_check GROUP BY 1 ORDER BY 1");
   while (table.step()) {

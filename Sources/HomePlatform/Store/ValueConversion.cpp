@@ -8,6 +8,8 @@
 #include <optional>
 #include <string_view>
 
+#include "PlatformModel/System/NDTextMatching.h"
+
 namespace nidus {
 namespace {
 
@@ -55,7 +57,7 @@ NDValueRef toInteger(const NDValueRef& value, const IntegerFormat& format) {
 }  // namespace
 
 NDValueRef convertToFormat(const NDValueRef& value, const NDString& format) {
-  if (!value) return nullptr;
+  if (!value || (value->isText() && !isUTF8(value->stringValue().view()))) return nullptr;
   if (format == "string") return value->isText() ? value : nullptr;
   const bool isBoolean = format == "bool";
   const bool isFloating = format == "float";

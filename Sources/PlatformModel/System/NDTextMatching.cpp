@@ -4,6 +4,7 @@
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <span>
 
 #include "PlatformModel/System/UnicodeTables.h"
@@ -25,9 +26,11 @@ constexpr std::size_t sequenceLength(unsigned char lead) noexcept {
   return lead >= 0xF0 && lead < 0xF5 ? 4 : 0;
 }
 
+constexpr char32_t kBeyondUnicode = 0x110000;
+
 constexpr bool isScalarOfLength(char32_t codePoint, std::size_t length) noexcept {
   constexpr char32_t kLeastOfLength[] = {0, 0, 0x80, 0x800, 0x10000};
-  return codePoint >= kLeastOfLength[length] && codePoint < 0x110000 &&
+  return codePoint >= kLeastOfLength[length] && codePoint < kBeyondUnicode &&
          (codePoint < 0xD800 || codePoint > 0xDFFF);
 }
 
@@ -35,7 +38,7 @@ constexpr bool isScalarOfLength(char32_t codePoint, std::size_t length) noexcept
 char32_t takeByte(std::string_view& text) noexcept {
   const auto byte = static_cast<unsigned char>(text.front());
   text.remove_prefix(1);
-  return 0x110000U + byte;
+  return kBeyondUnicode + byte;
 }
 
 char32_t takeCodePoint(std::string_view& text) noexcept {
@@ -182,6 +185,22 @@ void cutCommonEnd(std::string_view& a, std::string_view& b) noexcept {
 }
 
 }  // namespace
+
+bool isUTF8(std::string_view text) noexcept {
+  constexpr std::uint64_t kHighBits = 0x8080808080808080;
+  std::uint64_t next = 0;
+  while (!text.empty()) {
+    if (text.size() >= sizeof next) {
+      std::memcpy(&next, text.data(), sizeof next);
+      if ((next & kHighBits) == 0) {  // eight of ASCII
+        text.remove_prefix(sizeof next);
+        continue;
+      }
+    }
+    if (takeCodePoint(text) >= kBeyondUnicode) return false;
+  }
+  return true;
+}
 
 std::u32string withoutDiacritics(std::string_view text) {
   if (std::all_of(text.begin(), text.end(), isASCII)) return {text.begin(), text.end()};

@@ -17,6 +17,9 @@ namespace nidus {
 /// 0x110000 plus its value. May be called from any thread.
 [[nodiscard]] ND_EXPORT std::u32string withoutDiacritics(std::string_view text);
 
+/// Says whether a text is UTF-8. May be called from any thread.
+[[nodiscard]] ND_EXPORT bool isUTF8(std::string_view text) noexcept;
+
 /// Says whether `text` contains `part` when the case of ASCII letters is ignored. The empty part
 /// is contained in every text. May be called from any thread.
 [[nodiscard]] ND_EXPORT bool containsIgnoringCase(std::string_view text, std::string_view part);

@@ -269,12 +269,8 @@ bool isControl(char32_t c) {
 Status checkName(const std::string& name) {
   if (name.find_first_not_of(' ') == std::string::npos)
     return badInput("a name must not be empty or blank; give one");
-  // What is no UTF-8 stands in the decomposition beyond the last code point.
-  constexpr char32_t kBeyondUnicode = 0x110000;
+  if (!isUTF8(name)) return badInput("the name " + name + " is not UTF-8; give it in UTF-8");
   const std::u32string codePoints = withoutDiacritics(name);
-  const bool isText = std::all_of(codePoints.begin(), codePoints.end(),
-                                  [](char32_t c) { return c < kBeyondUnicode; });
-  if (!isText) return badInput("the name " + name + " is not UTF-8; give it in UTF-8");
   if (std::any_of(codePoints.begin(), codePoints.end(), isControl)) {
     return badInput("the name " + name + " has control characters; leave them out");
   }

@@ -5,6 +5,7 @@
 
 #include <array>
 #include <filesystem>
+#include <fstream>
 #include <string>
 
 #include "HomePlatform/Store/BackupList.h"
@@ -118,6 +119,90 @@ TEST_F(HostileStoreTest, ReadsNoStatementOfAbsurdLength) {
   for (int i = 0; i < 1500; ++i) table += ", column" + std::to_string(i);
   change((table + ")").c_str());
   EXPECT_THAT(openingProblem(), StartsWith(file().string() + ": the database is damaged ("));
+}
+
+/// A database of many rooms, in which the pages of a table or an index lead to one another.
+class CircularStoreTest : public HostileStoreTest {
+ protected:
+  void SetUp() override {
+    HomeData home;
+    home.name = "Manor";
+    for (int i = 0; i < 2000; ++i) home.rooms.push_back({NDUUID::random(), "Kitchen"});
+    const auto store = HomeStore::open(file());
+    ASSERT_TRUE(store);
+    ASSERT_FALSE((*store)->replaceHomes({home}));
+  }
+
+  /// Has each child of the first page of `tree` be the next one of `more` pages like it, and those
+  /// of the last one be `last`; the first page itself without one.
+  void redirect(const std::string& tree, std::size_t more, bool endsInLeaf) const {
+    const std::size_t root = rootOf(tree);
+    std::string bytes = contentOfFile(file());
+    const std::string page = bytes.substr((root - 1) * kPage, kPage);
+    const std::size_t count = bytes.size() / kPage;
+    const std::size_t last = endsInLeaf ? number(page, number(page, 12, 2), 4) : root;
+    bytes.replace((root - 1) * kPage, kPage, leadingTo(more > 0 ? count + 1 : last, page));
+    for (std::size_t i = 1; i <= more; ++i) {
+      bytes += leadingTo(i < more ? count + i + 1 : last, page);
+    }
+    put(bytes, 28, count + more);
+    std::ofstream(file(), std::ios::binary) << bytes;
+  }
+
+ private:
+  static constexpr std::size_t kPage = 4096;
+
+  [[nodiscard]] std::size_t rootOf(const std::string& tree) const {
+    Database database(file().string(), kNoPatience);
+    const std::string query = "SELECT rootpage FROM sqlite_schema WHERE name = '" + tree + "'";
+    return static_cast<std::size_t>(database.number(query.c_str()));
+  }
+  /// A big-endian number.
+  static std::size_t number(const std::string& bytes, std::size_t place, std::size_t length) {
+    std::size_t value = 0;
+    for (std::size_t i = 0; i < length; ++i) {
+      value = value << 8U | static_cast<unsigned char>(bytes[place + i]);
+    }
+    return value;
+  }
+  static void put(std::string& bytes, std::size_t place, std::size_t value) {
+    for (std::size_t i = 4; i-- > 0; value >>= 8U) bytes[place + i] = static_cast<char>(value);
+  }
+  /// The page with `child` in place of all its children.
+  static std::string leadingTo(std::size_t child, std::string page) {
+    const std::size_t cells = number(page, 3, 2);
+    for (std::size_t i = 0; i < cells; ++i) put(page, number(page, 12 + 2 * i, 2), child);
+    put(page, 8, child);
+    return page;
+  }
+};
+
+TEST_F(CircularStoreTest, ReadsNoPageWithinItself) {
+  redirect("sqlite_autoindex_room_1", 0, false);
+  EXPECT_THAT(loadingProblem(), StartsWith(damage("database disk image is malformed")));
+  EXPECT_TRUE(examineStore(file(), kNoPatience).isDamaged);
+}
+
+TEST_F(CircularStoreTest, ReadsNoPagesAgainAndAgain) {
+  redirect("sqlite_autoindex_room_1", 10, true);
+  EXPECT_THAT(loadingProblem(),
+              StartsWith(damage("its pages lead to one another again and again")));
+}
+
+TEST_F(CircularStoreTest, ExaminesNoPagesAgainAndAgain) {
+  for (const char* tree : {"room", "sqlite_autoindex_room_1", "sqlite_autoindex_room_2"}) {
+    SetUp();
+    redirect(tree, 10, true);
+    EXPECT_TRUE(examineStore(file(), kNoPatience).isDamaged) << tree;
+    EXPECT_FALSE(homesOfBackup(file())) << tree;
+    fs::remove(file());
+  }
+}
+
+TEST_F(HostileStoreTest, ReadsNoTextBesideUTF8) {
+  change("UPDATE room SET name = CAST(x'4BFF' AS TEXT)");
+  EXPECT_THAT(loadingProblem(), StartsWith(damage("unexpected contents of column name")));
+  EXPECT_TRUE(examineStore(file(), kNoPatience).isDamaged);
 }
 
 TEST_F(HostileStoreTest, RefusesWhatIsNoFile) {

@@ -110,6 +110,13 @@ TEST(ConvertToFormatTest, KeepsTheSameObject) {
   EXPECT_EQ(convertToFormat(value, nullptr), value);
 }
 
+TEST(ConvertToFormatTest, TakesNoTextBesideUTF8) {
+  for (const char* format : {"string", "", "other"}) {
+    EXPECT_EQ(convertToFormat(NDValue::text("caf\xE9"), format), nullptr) << format;
+    EXPECT_NE(convertToFormat(NDValue::text("caf\xC3\xA9"), format), nullptr) << format;
+  }
+}
+
 TEST(IsSameValueTest, TellsKindsAndBitsApart) {
   const NDValueRef values[] = {nullptr,        NDValue::boolean(true), integer(1),
                                floating(1.0F), floating(0.0F),         floating(-0.0F),

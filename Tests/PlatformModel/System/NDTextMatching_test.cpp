@@ -136,5 +136,16 @@ TEST(ContainsIgnoringCaseTest, FoldsAsciiLettersAlone) {
   }
 }
 
+TEST(IsUTF8Test, TakesWholeSequencesOfScalarsAlone) {
+  for (const char* text : {"", "Kitchen", "Beach House", "K\u00FCche", "K\u00FCche im Haus",
+                           "\uFFFF", "\U00010000", "\U0010FFFF"}) {
+    EXPECT_TRUE(isUTF8(text)) << text;
+  }
+  for (const char* text : {"\xFF", "Kitchen \xE9 of", "\xC3", "eight by\xC3", "\xC0\x80",
+                           "\xED\xA0\x80", "\xF4\x90\x80\x80", "\x80 begins"}) {
+    EXPECT_FALSE(isUTF8(text)) << text;
+  }
+}
+
 }  // namespace
 }  // namespace nidus
