@@ -4,6 +4,7 @@ namespace nidus {
 
 NDDictionary VAHAActionResult::dictionary() const {
   NDDictionary form;
+  form.reserve(4);
   form.setIfPresent("outcome", outcome_);
   form.setIfPresent("resultAttribute", resultAttribute_);
   if (resultValue_) form.set("resultValue", NDDictionaryValue(resultValue_->dictionary()));

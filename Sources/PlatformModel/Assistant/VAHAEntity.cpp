@@ -6,6 +6,7 @@ std::shared_ptr<VAHAEntity> VAHAEntity::entity() { return std::make_shared<VAHAE
 
 NDDictionary VAHAEntity::dictionary() const {
   NDDictionary form;
+  form.reserve(7);
   form.setIfPresent("name", name_);
   if (identifier_) form.setIfPresent("identifier", identifier_.text());
   form.setIfPresent("entityType", entityType_);

@@ -16,6 +16,7 @@ VAHAValue::~VAHAValue() = default;
 
 NDDictionary VAHAValue::dictionary() const {
   NDDictionary form;
+  form.reserve(2);
   addValue(form);
   form.setIfPresent("units", units_);
   return form;

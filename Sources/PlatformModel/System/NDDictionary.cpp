@@ -4,6 +4,8 @@
 
 namespace nidus {
 
+void NDDictionary::reserve(std::size_t count) { entries_.reserve(count); }
+
 void NDDictionary::set(std::string_view key, NDDictionaryValue value) {
   const auto entry = std::find_if(entries_.begin(), entries_.end(),
                                   [key](const Entry& candidate) { return candidate.first == key; });
@@ -39,9 +41,8 @@ std::vector<NDDictionary::Entry>::const_iterator NDDictionary::end() const noexc
 
 bool operator==(const NDDictionary& a, const NDDictionary& b) { return a.entries_ == b.entries_; }
 
-NDDictionaryValue::NDDictionaryValue(NDString value) : content_(nullptr) {
-  if (value) content_ = std::move(value);
-}
+NDDictionaryValue::NDDictionaryValue(NDString value)
+    : content_(value ? Content(std::move(value)) : Content(nullptr)) {}
 
 bool operator==(const NDDictionaryValue& a, const NDDictionaryValue& b) {
   return a.content_ == b.content_;

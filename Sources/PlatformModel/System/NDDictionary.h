@@ -24,6 +24,8 @@ class ND_EXPORT NDDictionary {
  public:
   using Entry = std::pair<std::string, NDDictionaryValue>;
 
+  /// Makes room for `count` keys.
+  void reserve(std::size_t count);
   /// Sets `key`, replacing an earlier value.
   void set(std::string_view key, NDDictionaryValue value);
   /// Sets `key` to `text` unless `text` is null.

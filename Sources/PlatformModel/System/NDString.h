@@ -1,10 +1,13 @@
 #pragma once
 
+#include <atomic>
 #include <cstddef>
 #include <functional>
+#include <initializer_list>
 #include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "PlatformModel/System/NDExport.h"
 
@@ -26,22 +29,39 @@ class ND_EXPORT NDString {
   NDString() noexcept = default;
   NDString(std::nullptr_t) noexcept {}  // NOLINT(google-explicit-constructor): null is a text
   /// Copies `text`; a null pointer gives the null text.
-  NDString(const char* text);  // NOLINT(google-explicit-constructor): a literal is a text
+  // NOLINTNEXTLINE(google-explicit-constructor): a literal is a text
+  NDString(const char* text) : text_(text ? makeText(text) : nullptr) {}
   /// Copies `text`, which may be empty, but never gives null.
-  NDString(std::string_view text);    // NOLINT(google-explicit-constructor): as above
-  NDString(const std::string& text);  // NOLINT(google-explicit-constructor): as above
+  // NOLINTNEXTLINE(google-explicit-constructor): as above
+  NDString(std::string_view text) : text_(makeText(text)) {}
+  // NOLINTNEXTLINE(google-explicit-constructor): as above
+  NDString(const std::string& text) : text_(makeText(text)) {}
 
-  NDString(const NDString& other) noexcept;
-  NDString(NDString&& other) noexcept;
-  NDString& operator=(const NDString& other) noexcept;
-  NDString& operator=(NDString&& other) noexcept;
-  ~NDString();
+  /// Makes the text of all `parts`, one after the other.
+  [[nodiscard]] static NDString joined(std::initializer_list<std::string_view> parts);
+
+  NDString(const NDString& other) noexcept : text_(other.text_) { retain(); }
+  NDString(NDString&& other) noexcept : text_(std::exchange(other.text_, nullptr)) {}
+  NDString& operator=(const NDString& other) noexcept {
+    NDString copy(other);
+    std::swap(text_, copy.text_);
+    return *this;
+  }
+  NDString& operator=(NDString&& other) noexcept {
+    NDString taken(std::move(other));
+    std::swap(text_, taken.text_);
+    return *this;
+  }
+  ~NDString() { release(); }
 
   /// Says whether there is a text, be it empty.
   explicit operator bool() const noexcept { return text_ != nullptr; }
 
   /// Gives the characters; empty for null. Valid as long as any copy of this text lives.
-  [[nodiscard]] std::string_view view() const noexcept;
+  [[nodiscard]] std::string_view view() const noexcept {
+    if (!text_) return {};
+    return {charactersOf(text_), text_->length};
+  }
 
   /// Copies the characters; empty for null.
   [[nodiscard]] std::string str() const { return std::string(view()); }
@@ -60,7 +80,31 @@ class ND_EXPORT NDString {
   }
 
  private:
-  struct Text;  // reference count, length and characters in one block
+  /// The head of the block that copies share; the characters follow it.
+  struct Text {
+    explicit Text(std::size_t textLength) noexcept : length(textLength) {}
+    std::atomic<std::size_t> references{1};
+    const std::size_t length;
+  };
+
+  static Text* makeText(std::size_t length);  ///< The characters are still to be written.
+  static Text* makeText(std::string_view text);
+  static void destroy(Text* text) noexcept;
+  static char* charactersOf(Text* text) noexcept { return reinterpret_cast<char*>(text + 1); }
+
+  void retain() const noexcept {
+    if (text_) text_->references.fetch_add(1, std::memory_order_relaxed);
+  }
+  void release() const noexcept {
+    if (!text_) return;
+    // Whoever releases last must see all that the other owners did with the characters. An owner
+    // that is the only one stays so, and need not count.
+    if (text_->references.load(std::memory_order_acquire) == 1 ||
+        text_->references.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+      destroy(text_);
+    }
+  }
+
   Text* text_ = nullptr;
 };
 

@@ -211,7 +211,7 @@ std::u32string withoutDiacritics(std::string_view text) {
   return out;
 }
 
-bool isEqualIgnoringDiacritics(std::string_view a, std::string_view b) {
+bool isEqualIgnoringDiacriticsWithin(std::string_view a, std::string_view b) {
   // No ASCII character changes or moves, so the texts may be cut beside any of them, and where both
   // have one, or one has it and the other ends, it decides. The ends come first: names that differ
   // in a number do so there.

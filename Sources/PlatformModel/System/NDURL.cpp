@@ -2,15 +2,21 @@
 
 #include <algorithm>
 #include <stdexcept>
-#include <string>
 
 namespace nidus {
 namespace {
 
 /// The place of the colon that ends the scheme of `text`; `npos` without a scheme.
 std::size_t schemeEnd(std::string_view text) noexcept {
-  const std::size_t end = text.find_first_of(":/?#");
-  return end != std::string_view::npos && text[end] == ':' ? end : std::string_view::npos;
+  const auto endsScheme = [](char c) { return c == ':' || c == '/' || c == '?' || c == '#'; };
+  const auto* const end = std::find_if(text.begin(), text.end(), endsScheme);
+  if (end == text.end() || *end != ':') return std::string_view::npos;
+  return static_cast<std::size_t>(end - text.begin());
+}
+
+/// `text` up to the first `mark`; all of it without one.
+std::string_view upTo(char mark, std::string_view text) noexcept {
+  return text.substr(0, text.find(mark));
 }
 
 /// Takes the next component, which is never empty, off the front of a path; empty at the end.
@@ -24,10 +30,7 @@ std::string_view takeComponent(std::string_view& path) noexcept {
 }  // namespace
 
 NDURL NDURL::make(std::string_view scheme, std::string_view host, std::string_view path) {
-  std::string text;
-  text.reserve(scheme.size() + 3 + host.size() + path.size());
-  text.append(scheme).append("://").append(host).append(path);
-  return fromText(text);
+  return fromText(NDString::joined({scheme, "://", host, path}));
 }
 
 NDURL NDURL::fromText(NDString text) { return NDURL(std::move(text)); }
@@ -41,7 +44,7 @@ NDString NDURL::scheme() const {
 std::string_view NDURL::path() const noexcept {
   std::string_view rest = text_.view();
   rest.remove_prefix(schemeEnd(rest) + 1);  // `npos` and one more is none
-  rest = rest.substr(0, rest.find_first_of("?#"));
+  rest = upTo('?', upTo('#', rest));
   if (!rest.starts_with("//")) return rest;
   const std::size_t begin = rest.find('/', 2);
   return begin == std::string_view::npos ? std::string_view() : rest.substr(begin);
@@ -68,11 +71,10 @@ std::string_view NDURL::pathComponent(std::size_t index) const {
 }
 
 std::optional<std::string_view> NDURL::queryView() const noexcept {
-  const std::string_view text = text_.view();
-  const std::size_t mark = text.find_first_of("?#");
-  if (mark == std::string_view::npos || text[mark] == '#') return std::nullopt;
-  const std::string_view query = text.substr(mark + 1);
-  return query.substr(0, query.find('#'));
+  const std::string_view text = upTo('#', text_.view());
+  const std::size_t mark = text.find('?');
+  if (mark == std::string_view::npos) return std::nullopt;
+  return text.substr(mark + 1);
 }
 
 NDString NDURL::query() const {

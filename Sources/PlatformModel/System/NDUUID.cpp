@@ -7,6 +7,7 @@
 #include <atomic>
 #include <bit>
 #include <cerrno>
+#include <cstring>
 #include <system_error>
 
 #include "PlatformModel/System/NDRunOnce.h"
@@ -14,7 +15,15 @@
 namespace nidus {
 namespace {
 
-constexpr std::string_view kDigits = "0123456789ABCDEF";
+/// The two hexadecimal digits of each byte.
+constexpr auto kDigitPairs = [] {
+  constexpr std::string_view kDigits = "0123456789ABCDEF";
+  std::array<std::array<char, 2>, 256> pairs{};
+  for (std::size_t byte = 0; byte < pairs.size(); ++byte) {
+    pairs[byte] = {kDigits[byte >> 4], kDigits[byte & 0x0F]};
+  }
+  return pairs;
+}();
 
 // Counts the forks of this process: bytes drawn before a fork belong to the parent, or parent and
 // child would make the same UUIDs.
@@ -53,10 +62,6 @@ struct RandomBytes {
 
 constinit thread_local RandomBytes randomBytes{};
 
-constexpr bool isDashPosition(std::size_t position) {
-  return position == 8 || position == 13 || position == 18 || position == 23;
-}
-
 /// A bijection that makes each bit of the result depend on each bit of `value`.
 constexpr std::uint64_t mixed(std::uint64_t value) noexcept {
   value = (value ^ value >> 33) * 0xFF51AFD7ED558CCD;
@@ -64,12 +69,25 @@ constexpr std::uint64_t mixed(std::uint64_t value) noexcept {
   return value ^ value >> 33;
 }
 
-/// The value of a hexadecimal digit, -1 for any other character.
+/// Where the digits of each byte stand in the text, and where the dashes do.
+constexpr std::array<std::size_t, 16> kDigitPlaces = {0,  2,  4,  6,  9,  11, 14, 16,
+                                                      19, 21, 24, 26, 28, 30, 32, 34};
+constexpr std::array<std::size_t, 4> kDashPlaces = {8, 13, 18, 23};
+
+/// The value of each hexadecimal digit, -1 for any other character.
+constexpr auto kDigitValues = [] {
+  std::array<std::int8_t, 256> values{};
+  values.fill(-1);
+  for (const std::string_view digits : {"0123456789ABCDEF", "0123456789abcdef"}) {
+    for (std::size_t value = 0; value < digits.size(); ++value) {
+      values[static_cast<unsigned char>(digits[value])] = static_cast<std::int8_t>(value);
+    }
+  }
+  return values;
+}();
+
 constexpr int digitValue(char digit) noexcept {
-  if (digit >= '0' && digit <= '9') return digit - '0';
-  if (digit >= 'A' && digit <= 'F') return digit - 'A' + 10;
-  if (digit >= 'a' && digit <= 'f') return digit - 'a' + 10;
-  return -1;
+  return kDigitValues[static_cast<unsigned char>(digit)];
 }
 
 }  // namespace
@@ -83,18 +101,18 @@ NDUUID NDUUID::random() {
 
 std::optional<NDUUID> NDUUID::fromText(std::string_view text) noexcept {
   if (text.size() != kTextLength) return std::nullopt;
-  std::array<std::uint8_t, 16> bytes{};
-  std::size_t digits = 0;
-  for (std::size_t position = 0; position < kTextLength; ++position) {
-    if (isDashPosition(position)) {
-      if (text[position] != '-') return std::nullopt;
-      continue;
-    }
-    const int value = digitValue(text[position]);
-    if (value < 0) return std::nullopt;
-    std::uint8_t& byte = bytes[digits++ / 2];
-    byte = static_cast<std::uint8_t>(byte << 4 | value);
+  for (const std::size_t place : kDashPlaces) {
+    if (text[place] != '-') return std::nullopt;
   }
+  std::array<std::uint8_t, 16> bytes{};
+  int allValues = 0;  // negative as soon as one of them is
+  for (std::size_t index = 0; index < bytes.size(); ++index) {
+    const char* const digits = &text[kDigitPlaces[index]];
+    const int value = digitValue(digits[0]) << 4 | digitValue(digits[1]);
+    allValues |= value;
+    bytes[index] = static_cast<std::uint8_t>(value);
+  }
+  if (allValues < 0) return std::nullopt;
   return NDUUID(bytes);
 }
 
@@ -111,11 +129,11 @@ std::size_t NDUUID::hash() const noexcept {
 }
 
 void NDUUID::writeText(char* out) const noexcept {
-  std::size_t position = 0;
-  for (const std::uint8_t byte : bytes_) {
-    if (isDashPosition(position)) out[position++] = '-';
-    out[position++] = kDigits[byte >> 4];
-    out[position++] = kDigits[byte & 0x0F];
+  for (const std::size_t place : kDashPlaces) out[place] = '-';
+  const std::array<std::uint8_t, 16> bytes = bytes_;  // which `out` cannot overlap
+  for (std::size_t index = 0; index < bytes.size(); ++index) {
+    const std::array<char, 2>& digits = kDigitPairs[bytes[index]];
+    std::memcpy(out + kDigitPlaces[index], digits.data(), digits.size());
   }
 }
 

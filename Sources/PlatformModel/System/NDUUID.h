@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <bit>
 #include <compare>
 #include <cstddef>
 #include <cstdint>
@@ -42,6 +43,11 @@ class ND_EXPORT NDUUID {
   /// process, so that nobody can think of UUIDs that make look-ups slow.
   [[nodiscard]] std::size_t hash() const noexcept;
 
+  friend constexpr bool operator==(const NDUUID& a, const NDUUID& b) noexcept {
+    // As two numbers: batches find their accessories by comparing.
+    using Halves = std::array<std::uint64_t, 2>;
+    return std::bit_cast<Halves>(a.bytes_) == std::bit_cast<Halves>(b.bytes_);
+  }
   // NOLINTNEXTLINE(modernize-use-nullptr): the check takes the default for a null pointer
   friend constexpr auto operator<=>(const NDUUID&, const NDUUID&) noexcept = default;
 
