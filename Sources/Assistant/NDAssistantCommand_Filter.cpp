@@ -28,9 +28,25 @@ bool contains(const NDURL& field, const NDString& part) {
   return field && part && containsIgnoringCase(field.text().view(), part.view());
 }
 
-bool contains(const TextList& field, const NDString& text) {
-  return text && std::find(field.begin(), field.end(), text) != field.end();
-}
+/// Says which lists contain a text. Objects that follow each other often share their list, and its
+/// answer is remembered.
+class ListsWith {
+ public:
+  explicit ListsWith(const NDString& text) : text_(text) {}
+
+  [[nodiscard]] bool contain(const TextList& list) {
+    if (list.begin() != last_) {
+      last_ = list.begin();
+      contains_ = text_ && std::find(list.begin(), list.end(), text_) != list.end();
+    }
+    return contains_;
+  }
+
+ private:
+  const NDString& text_;
+  TextList::const_iterator last_ = nullptr;  // that of the empty list, which contains nothing
+  bool contains_ = false;
+};
 
 template <class Predicate>
 ObjectList matching(const ObjectList& objects, const Predicate& matches) {
@@ -293,8 +309,9 @@ ObjectList NDAssistantCommand::filterObjects_forRoom_andZone(const ObjectList& o
 
 ObjectList NDAssistantCommand::filterObjects_forGroup(const ObjectList& objects,
                                                       const NDString& groupName) const {
-  return matching(objects, [&groupName](const HomeObjectRecord& object) {
-    return contains(object.objectGroups, groupName);
+  ListsWith listsWithName(groupName);
+  return matching(objects, [&listsWithName](const HomeObjectRecord& object) {
+    return listsWithName.contain(object.objectGroups);
   });
 }
 
@@ -302,9 +319,10 @@ ObjectList NDAssistantCommand::filterObjects_byAttribute(const ObjectList& objec
                                                          const NDString& attribute) const {
   const NDString type =
       property(metadata_, &NDNAPMetadata::mapReadCharcteristicFromAssistantName, attribute);
-  const auto hasType = [&type](const HomeObjectRecord& object) {
+  ListsWith listsWithType(type);
+  const auto hasType = [&listsWithType](const HomeObjectRecord& object) {
     return object.objectType == VAHAEntityTypeSERVICEValue &&
-           contains(object.objectCharacteristics, type);
+           listsWithType.contain(object.objectCharacteristics);
   };
   return matching(objects, hasType);
 }
@@ -312,6 +330,7 @@ ObjectList NDAssistantCommand::filterObjects_byAttribute(const ObjectList& objec
 NDAssistantCommand::CharacteristicList NDAssistantCommand::filterObjects_forcharacteristicType(
     const ObjectList& objects, const NDString& type) const {
   CharacteristicList found;
+  found.reserve(objects.size());
   ServiceLookUp lookUp(gather_);
   for (const HomeObjectRecord* object : objects) {
     const auto service = lookUp.service(*object);
