@@ -19,9 +19,16 @@ bool areOfTypes(const NDArray<NDCharacteristic>& characteristics,
 TextList AddressableTypes::of(const NDService& service) {
   if (!metadata_) return {};
   const NDArray<NDCharacteristic>& characteristics = service.characteristics();
-  Known& known = byServiceType_[service.serviceType()];
+  Known& known = knownOf(service.serviceType());
   if (!areOfTypes(characteristics, known.all)) known = judged(characteristics);
   return known.addressable;
+}
+
+/// Services of one type often follow each other.
+AddressableTypes::Known& AddressableTypes::knownOf(const NDString& serviceType) {
+  if (!last_ || last_->first != serviceType)
+    last_ = &*byServiceType_.try_emplace(serviceType).first;
+  return last_->second;
 }
 
 AddressableTypes::Known AddressableTypes::judged(

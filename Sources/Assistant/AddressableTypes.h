@@ -1,6 +1,7 @@
 #pragma once
 
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "Assistant/TextList.h"
@@ -27,10 +28,12 @@ class AddressableTypes {
     TextList addressable;
   };
 
+  [[nodiscard]] Known& knownOf(const NDString& serviceType);
   [[nodiscard]] Known judged(const NDArray<NDCharacteristic>& characteristics) const;
 
   const NDNAPMetadata* const metadata_;
   std::unordered_map<NDString, Known> byServiceType_;
+  std::pair<const NDString, Known>* last_ = nullptr;  // in the map; its entries stay where they are
 };
 
 }  // namespace nidus

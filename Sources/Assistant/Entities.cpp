@@ -4,6 +4,7 @@
 #include <string_view>
 #include <utility>
 
+#include "Assistant/EntityTypes.h"
 #include "Assistant/ObjectURL.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/Home/NDNAPMetadata.h"
@@ -31,19 +32,29 @@ std::shared_ptr<VAHAEntity> entityWith(NDString name, NDString entityType) {
   return entity;
 }
 
-NDString assistantServiceType(const NDString& platformServiceType) {
-  const auto metadata = NDNAPMetadata::getSharedInstance();
-  NDString mapped = metadata ? metadata->mapToAssistantServiceName(platformServiceType) : nullptr;
+NDString assistantServiceType(const NDString& platformServiceType, const NDNAPMetadata* metadata) {
+  NDString mapped =
+      property(metadata, &NDNAPMetadata::mapToAssistantServiceName, platformServiceType);
   return mapped ? mapped : NDString(kCustomServiceType);
+}
+
+NDString assistantServiceTypeOf(const std::shared_ptr<NDService>& service) {
+  return assistantServiceType(property(service, &NDService::serviceType),
+                              NDNAPMetadata::getSharedInstance().get());
 }
 
 }  // namespace
 
 std::shared_ptr<VAHAEntity> entityFromObject(const HomeObjectRecord& record) {
+  return entityFromObject(record, NDNAPMetadata::getSharedInstance().get());
+}
+
+std::shared_ptr<VAHAEntity> entityFromObject(const HomeObjectRecord& record,
+                                             const NDNAPMetadata* metadata) {
   auto entity = entityWith(record.objectName, record.objectType);
   if (record.objectType == VAHAEntityTypeSERVICEValue) {
     if (record.objectRoom != record.objectHome) entity->setRoom(record.objectRoom);
-    entity->setServiceType(assistantServiceType(record.objectServiceType));
+    entity->setServiceType(assistantServiceType(record.objectServiceType, metadata));
   }
   entity->setHome(record.objectHome);
   entity->setZone(record.objectZone);
@@ -52,9 +63,8 @@ std::shared_ptr<VAHAEntity> entityFromObject(const HomeObjectRecord& record) {
 
 std::shared_ptr<VAHAEntity> entityFromService(const std::shared_ptr<NDService>& service,
                                               const NDString& serviceType) {
-  auto entity = entityWith(property(service, &NDService::name), VAHAEntityTypeSERVICEValue);
-  const NDString mapped = assistantServiceType(property(service, &NDService::serviceType));
-  entity->setServiceType(serviceType ? serviceType : mapped);
+  auto entity = entityWith(property(service, &NDService::name), entityTypes().service);
+  entity->setServiceType(serviceType ? serviceType : assistantServiceTypeOf(service));
   const auto accessory = property(service, &NDService::accessory);
   const auto home = property(accessory, &NDAccessory::home);
   entity->setHome(property(home, &NDHome::name));
@@ -65,11 +75,11 @@ std::shared_ptr<VAHAEntity> entityFromService(const std::shared_ptr<NDService>& 
 }
 
 std::shared_ptr<VAHAEntity> entityFromActionSet(const std::shared_ptr<NDActionSet>& actionSet) {
-  return entityWith(property(actionSet, &NDActionSet::name), VAHAEntityTypeSCENEValue);
+  return entityWith(property(actionSet, &NDActionSet::name), entityTypes().scene);
 }
 
 std::shared_ptr<VAHAEntity> entityFromTrigger(const std::shared_ptr<NDTrigger>& trigger) {
-  return entityWith(property(trigger, &NDTrigger::name), VAHAEntityTypeTRIGGERValue);
+  return entityWith(property(trigger, &NDTrigger::name), entityTypes().trigger);
 }
 
 }  // namespace nidus

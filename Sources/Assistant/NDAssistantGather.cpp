@@ -3,6 +3,7 @@
 #include <utility>
 
 #include "Assistant/AddressableTypes.h"
+#include "Assistant/EntityTypes.h"
 #include "Assistant/HomeMemberships.h"
 #include "Assistant/ObjectURL.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
@@ -12,23 +13,6 @@
 
 namespace nidus {
 namespace {
-
-/// The entity types as texts that all records share. They are made on first use and never
-/// destroyed, because a platform's thread may still gather while the process ends.
-struct EntityTypes {
-  NDString home = VAHAEntityTypeHOMEValue;
-  NDString service = VAHAEntityTypeSERVICEValue;
-  NDString group = VAHAEntityTypeGROUPValue;
-  NDString room = VAHAEntityTypeROOMValue;
-  NDString zone = VAHAEntityTypeZONEValue;
-  NDString scene = VAHAEntityTypeSCENEValue;
-  NDString trigger = VAHAEntityTypeTRIGGERValue;
-};
-
-const EntityTypes& entityTypes() {
-  static const EntityTypes& types = *new EntityTypes;
-  return types;
-}
 
 bool areHomesConfigured() {
   const auto platform = NDPlatform::registered();

@@ -15,6 +15,7 @@
 #include "Assistant/Entities.h"
 #include "Logging/WLOLog.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
+#include "PlatformModel/Home/NDNAPMetadata.h"
 #include "PlatformModel/NDPlatform.h"
 #include "PlatformModel/System/NDDeliveryHold.h"
 #include "PlatformModel/System/NDSerialQueue.h"
@@ -63,8 +64,9 @@ bool isPublished(const HomeObjectRecord& record) {
 NDAssistantSyncHome::Entities publishedEntities(const HomeObjectRecords& records) {
   NDAssistantSyncHome::Entities entities;
   entities.reserve(records.size());
+  const auto metadata = NDNAPMetadata::getSharedInstance();
   for (const HomeObjectRecord& record : records) {
-    if (isPublished(record)) entities.push_back(entityFromObject(record));
+    if (isPublished(record)) entities.push_back(entityFromObject(record, metadata.get()));
   }
   return entities;
 }
