@@ -1,6 +1,5 @@
 #include "Assistant/ActionRun.h"
 
-#include "Assistant/Results.h"
 #include "PlatformModel/NDPlatform.h"
 #include "PlatformModel/System/NDMutex.h"
 
@@ -36,20 +35,14 @@ ActionRun::ActionRun(std::shared_ptr<const NDAssistantCommand> command, VAHAActi
 
 ActionRun::~ActionRun() = default;
 
-void ActionRun::addResult(std::string_view outcome,
-                          const std::shared_ptr<NDService>& service) const {
-  auto result = std::make_shared<VAHAActionResult>();
-  result->setOutcome(outcome);
-  populateResultWithService(*result, serviceType_, action_, service);
-  results_->append(std::move(result));
+void ActionRun::ResultWriter::add(std::string_view outcome,
+                                  const std::shared_ptr<NDService>& service) {
+  results_->append(maker_.make(outcome, service));
 }
 
-void ActionRun::addResultIfAnswer(std::string_view outcome,
-                                  const std::shared_ptr<NDService>& service) const {
-  auto result = std::make_shared<VAHAActionResult>();
-  result->setOutcome(outcome);
-  const bool isAnswer = populateResultWithService(*result, serviceType_, action_, service);
-  if (isAnswer) results_->append(std::move(result));
+void ActionRun::ResultWriter::addIfAnswer(std::string_view outcome,
+                                          const std::shared_ptr<NDService>& service) {
+  if (auto result = maker_.makeIfAnswer(outcome, service)) results_->append(std::move(result));
 }
 
 void ActionRun::reportWhenAnswered() const {

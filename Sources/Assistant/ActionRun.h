@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "Assistant/NDAssistantCommand.h"
+#include "Assistant/ResultMaker.h"
 #include "PlatformModel/System/NDWaitGroup.h"
 
 namespace nidus {
@@ -19,11 +20,29 @@ namespace nidus {
 ///     run->enter();
 ///     home.readCharacteristicValues_withCompletionHandler(list, [run](auto& error, auto& all) {
 ///       const ActionRun::Answer answer(*run);
-///       for (const auto& response : all) run->addResult(...);
+///       ActionRun::ResultWriter results(*run);
+///       for (const auto& response : all) results.add(...);
 ///     });
 ///     run->reportWhenAnswered();
 class ActionRun {
+  class ResultList;
+
  public:
+  /// Adds results to the run, of one batch or one thread.
+  class ResultWriter {
+   public:
+    explicit ResultWriter(const ActionRun& run)
+        : results_(run.results_), maker_(run.action_, run.serviceType_) {}
+    /// Adds a result about `service`, which may be null.
+    void add(std::string_view outcome, const std::shared_ptr<NDService>& service);
+    /// The same, unless the result turns out to be no answer to the action.
+    void addIfAnswer(std::string_view outcome, const std::shared_ptr<NDService>& service);
+
+   private:
+    const std::shared_ptr<ResultList> results_;
+    ResultMaker maker_;
+  };
+
   /// Stands for a batch that has been answered: leaves the group when it goes, on every path.
   class Answer {
    public:
@@ -50,11 +69,6 @@ class ActionRun {
   [[nodiscard]] const NDAssistantCommand& command() const { return *command_; }
   [[nodiscard]] const VAHAActionRef& action() const { return action_; }
 
-  /// Adds a result about `service`, which may be null. May be called from any thread.
-  void addResult(std::string_view outcome, const std::shared_ptr<NDService>& service) const;
-  /// The same, unless the result turns out to be no answer to the action.
-  void addResultIfAnswer(std::string_view outcome, const std::shared_ptr<NDService>& service) const;
-
   /// Enters the group, before a home is asked.
   void enter() const { group_->enter(); }
   /// Reports all results on the main queue as soon as every batch has left the group. Called once,
@@ -64,8 +78,6 @@ class ActionRun {
   void reportUnlockRequired() const { command_->reportUnlockRequired(handler_); }
 
  private:
-  class ResultList;
-
   const std::shared_ptr<const NDAssistantCommand> command_;
   const VAHAActionRef action_;
   const NDString serviceType_;

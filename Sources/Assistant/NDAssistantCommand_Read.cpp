@@ -2,6 +2,7 @@
 #include "Assistant/HomeTable.h"
 #include "Assistant/NDAssistantCommand.h"
 #include "Assistant/Outcomes.h"
+#include "Assistant/ResultMaker.h"
 #include "Assistant/Results.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/System/NDNull.h"
@@ -14,9 +15,10 @@ namespace {
 void batchDidRead(const ActionRun& run, const std::optional<NDError>& error,
                   const std::vector<NDCharacteristicResponse>& responses) {
   ActionRun::Answer answer(run);
+  ActionRun::ResultWriter results(run);
   const bool isUnlocked =
-      visitUntilLocked(error, responses, [&run](const NDCharacteristicResponse& response) {
-        run.addResultIfAnswer(outcomeOfRead(response.error), response.characteristic->service());
+      visitUntilLocked(error, responses, [&results](const NDCharacteristicResponse& response) {
+        results.addIfAnswer(outcomeOfRead(response.error), response.characteristic->service());
       });
   answer.leave();
   if (!isUnlocked) run.reportUnlockRequired();
@@ -95,12 +97,10 @@ void NDAssistantCommand::handleGetMetadataActionTypes_serviceType_forObjects_com
     return;
   }
   Results results;
+  ResultMaker maker(action, serviceType);
   for (const auto& characteristic : characteristics) {
-    auto result = std::make_shared<VAHAActionResult>();
-    result->setOutcome(VAHAActionOutcomeSUCCESSValue);
-    const bool isAnswer =
-        populateResultWithService(*result, serviceType, action, characteristic->service());
-    if (isAnswer) results.push_back(std::move(result));
+    auto result = maker.makeIfAnswer(VAHAActionOutcomeSUCCESSValue, characteristic->service());
+    if (result) results.push_back(std::move(result));
   }
   reportResults_handler(std::move(results), handler);
 }

@@ -73,19 +73,24 @@ struct HomeUpdate {
 
   using Responses = std::vector<NDCharacteristicResponse>;
   using Writes = std::vector<NDCharacteristicWriteRequestTuple>;
+  using ResultWriter = ActionRun::ResultWriter;
 
   void didRead(const std::optional<NDError>& error, const Responses& responses) const;
   void didWrite(const Responses& responses) const;
-  void addWriteOrResult(Writes& writes, const NDCharacteristicResponse& response) const;
-  void addWrite(Writes& writes, const std::shared_ptr<NDCharacteristic>& characteristic) const;
+  void addWriteOrResult(Writes& writes, ResultWriter& results,
+                        const NDCharacteristicResponse& response) const;
+  void addWrite(Writes& writes, ResultWriter& results,
+                const std::shared_ptr<NDCharacteristic>& characteristic) const;
 };
 
 void HomeUpdate::didRead(const std::optional<NDError>& error, const Responses& responses) const {
   ActionRun::Answer answer(*run);
+  ResultWriter results(*run);
   Writes writes;
-  const bool isUnlocked = visitUntilLocked(
-      error, responses,
-      [&](const NDCharacteristicResponse& response) { addWriteOrResult(writes, response); });
+  const bool isUnlocked =
+      visitUntilLocked(error, responses, [&](const NDCharacteristicResponse& response) {
+        addWriteOrResult(writes, results, response);
+      });
   if (!isUnlocked) {
     // The unlock is the only reply of the command: the group stays entered for good, and the report
     // of the results never comes due.
@@ -103,22 +108,23 @@ void HomeUpdate::didRead(const std::optional<NDError>& error, const Responses& r
 }
 
 /// Makes the write of a value that was read, and the result of one that could not be.
-void HomeUpdate::addWriteOrResult(Writes& writes, const NDCharacteristicResponse& response) const {
+void HomeUpdate::addWriteOrResult(Writes& writes, ResultWriter& results,
+                                  const NDCharacteristicResponse& response) const {
   if (response.error) {
-    run->addResult(outcomeOfRead(response.error), response.characteristic->service());
+    results.add(outcomeOfRead(response.error), response.characteristic->service());
   } else {
-    addWrite(writes, response.characteristic);
+    addWrite(writes, results, response.characteristic);
   }
 }
 
-void HomeUpdate::addWrite(Writes& writes,
+void HomeUpdate::addWrite(Writes& writes, ResultWriter& results,
                           const std::shared_ptr<NDCharacteristic>& characteristic) const {
   const auto service = characteristic->service();
   NDString outcome;
   NDValueRef value =
       run->command().updateValue_forAction_outcome(characteristic, run->action(), &outcome);
   if (outcome) {
-    run->addResult(outcome.view(), service);
+    results.add(outcome.view(), service);
     if (WLOShouldLogAtLevel(4)) {
       const auto accessory = property(service, &NDService::accessory);
       WLOLog(4, "Update boundary error %@ for service %@/%@",
@@ -135,8 +141,9 @@ void HomeUpdate::addWrite(Writes& writes,
 
 void HomeUpdate::didWrite(const Responses& responses) const {
   const ActionRun::Answer answer(*run);
+  ResultWriter results(*run);
   for (const NDCharacteristicResponse& response : responses) {
-    run->addResult(outcomeOfWrite(response.error), response.characteristic->service());
+    results.add(outcomeOfWrite(response.error), response.characteristic->service());
   }
 }
 
@@ -146,13 +153,14 @@ void updateByHome(const std::shared_ptr<const ActionRun>& run,
                   const NDAssistantCommand::CharacteristicList& characteristics,
                   const NDString& writeType) {
   HomeTable<std::shared_ptr<NDCharacteristic>> table;
+  ActionRun::ResultWriter results(*run);
   for (const auto& characteristic : characteristics) {
     const auto service = characteristic->service();
     const auto target = characteristicOfType(service, writeType);
     if (target && isWritable(*target)) {
       table.add(*characteristic, characteristic);
     } else {
-      run->addResult(VAHAActionOutcomeREAD_ONLYValue, service);
+      results.add(VAHAActionOutcomeREAD_ONLYValue, service);
     }
   }
   table.forEachHome(

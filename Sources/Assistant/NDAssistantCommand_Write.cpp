@@ -58,9 +58,10 @@ bool isToBeWritten(const NDCharacteristic& characteristic, const NDString& actio
 WriteTable decideWrites(const ActionRun& run,
                         const NDAssistantCommand::CharacteristicList& characteristics) {
   WriteTable table;
+  ActionRun::ResultWriter results(run);
   for (const auto& characteristic : characteristics) {
     if (!isWritable(*characteristic)) {
-      run.addResult(VAHAActionOutcomeREAD_ONLYValue, characteristic->service());
+      results.add(VAHAActionOutcomeREAD_ONLYValue, characteristic->service());
     } else if (isToBeWritten(*characteristic, run.action()->actionType())) {
       table.add(characteristic);
     }
@@ -73,9 +74,10 @@ WriteTable decideWrites(const ActionRun& run,
 void batchDidWrite(const ActionRun& run, const std::optional<NDError>& error,
                    const std::vector<NDCharacteristicResponse>& responses) {
   ActionRun::Answer answer(run);
+  ActionRun::ResultWriter results(run);
   const bool isUnlocked =
-      visitUntilLocked(error, responses, [&run](const NDCharacteristicResponse& response) {
-        run.addResult(outcomeOfWrite(response.error), response.characteristic->service());
+      visitUntilLocked(error, responses, [&results](const NDCharacteristicResponse& response) {
+        results.add(outcomeOfWrite(response.error), response.characteristic->service());
       });
   answer.leave();
   if (!isUnlocked) run.reportUnlockRequired();

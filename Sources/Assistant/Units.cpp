@@ -4,7 +4,6 @@
 #include "Logging/WLOLog.h"
 #include "PlatformModel/Assistant/VAHAConstants.h"
 #include "PlatformModel/Home/NDCharacteristicConstants.h"
-#include "PlatformModel/Home/NDNAPMetadata.h"
 #include "PlatformModel/NDPlatform.h"
 #include "PlatformModel/System/NDNull.h"
 #include "PlatformModel/System/NDRunOnce.h"
@@ -41,7 +40,11 @@ NDString getLocaleUnits(const NDString& units) {
 }
 
 NDString getReportingUnits(const NDString& requested, const NDString& type) {
-  const auto mapper = NDNAPMetadata::getSharedInstance();
+  return getReportingUnits(requested, type, NDNAPMetadata::getSharedInstance().get());
+}
+
+NDString getReportingUnits(const NDString& requested, const NDString& type,
+                           const NDNAPMetadata* mapper) {
   NDString native = property(mapper, &NDNAPMetadata::characteristicValueUnit, type);
   if (!property(mapper, &NDNAPMetadata::supportsLocalization, type)) return native;
   return requested ? requested : getLocaleUnits(native);

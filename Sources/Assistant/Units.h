@@ -1,5 +1,6 @@
 #pragma once
 
+#include "PlatformModel/Home/NDNAPMetadata.h"
 #include "PlatformModel/System/NDString.h"
 #include "PlatformModel/System/NDValue.h"
 
@@ -19,6 +20,9 @@ namespace nidus {
 /// which asked for the platform unit `requested`. For a type that follows the user's unit system
 /// the request wins over the locale; for any other the type's own unit is given. May be null.
 [[nodiscard]] NDString getReportingUnits(const NDString& requested, const NDString& type);
+/// The same with a mapper, which may be null, that has been asked for.
+[[nodiscard]] NDString getReportingUnits(const NDString& requested, const NDString& type,
+                                         const NDNAPMetadata* mapper);
 
 /// Turns `value` of the assistant attribute `name` into what is to be written. Where the type that
 /// is written for `name` does not follow the user's unit system, the mapper's value mapping is all.
