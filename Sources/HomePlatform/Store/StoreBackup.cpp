@@ -37,6 +37,7 @@ bool holdsHomes(const fs::path& file, std::chrono::milliseconds lockTimeout) {
 void copyAndCheck(const fs::path& from, const fs::path& to, std::chrono::milliseconds lockTimeout) {
   {
     Database source(from.string(), lockTimeout, Database::MissingFile::isAnError);
+    const WorkLimit limit(source);
     Statement(source, "VACUUM INTO ?").run(NDString(to.string()));
   }
   Database copy(to.string(), lockTimeout, Database::MissingFile::isAnError);

@@ -18,6 +18,7 @@ namespace nidus {
 namespace {
 
 namespace fs = std::filesystem;
+using testing::AllOf;
 using testing::HasSubstr;
 using testing::SizeIs;
 using testing::StartsWith;
@@ -125,12 +126,13 @@ TEST_F(HostileStoreTest, ReadsNoStatementOfAbsurdLength) {
 class CircularStoreTest : public HostileStoreTest {
  protected:
   void SetUp() override {
-    HomeData home;
-    home.name = "Manor";
-    for (int i = 0; i < 2000; ++i) home.rooms.push_back({NDUUID::random(), "Kitchen"});
+    home_.uuid = NDUUID::random();
+    home_.name = "Manor";
+    home_.rooms.clear();
+    for (int i = 0; i < 2000; ++i) home_.rooms.push_back({NDUUID::random(), "Kitchen"});
     const auto store = HomeStore::open(file());
     ASSERT_TRUE(store);
-    ASSERT_FALSE((*store)->replaceHomes({home}));
+    ASSERT_FALSE((*store)->replaceHomes({home_}));
   }
 
   /// Has each child of the first page of `tree` be the next one of `more` pages like it, and those
@@ -148,6 +150,8 @@ class CircularStoreTest : public HostileStoreTest {
     put(bytes, 28, count + more);
     std::ofstream(file(), std::ios::binary) << bytes;
   }
+
+  HomeData home_;
 
  private:
   static constexpr std::size_t kPage = 4096;
@@ -187,6 +191,20 @@ TEST_F(CircularStoreTest, ReadsNoPagesAgainAndAgain) {
   redirect("sqlite_autoindex_room_1", 10, true);
   EXPECT_THAT(loadingProblem(),
               StartsWith(damage("its pages lead to one another again and again")));
+}
+
+TEST_F(CircularStoreTest, ChangesNothingOfPagesAgainAndAgain) {
+  redirect("sqlite_autoindex_room_1", 10, true);
+  const auto store = HomeStore::open(file(), kNoPatience);
+  ASSERT_TRUE(store);
+  for (const auto& failure :
+       {(*store)->replaceHomes({}), (*store)->mergeHomes({home_}),
+        (*store)->editHomes([](std::vector<HomeData>& /*homes*/) { return Status(); })}) {
+    ASSERT_TRUE(failure);
+    EXPECT_THAT(failure->message,
+                AllOf(StartsWith(file().string() + ": the database is damaged ("),
+                      HasSubstr("its pages lead to one another again and again")));
+  }
 }
 
 TEST_F(CircularStoreTest, ExaminesNoPagesAgainAndAgain) {
