@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -32,19 +33,21 @@ struct Row {
   double goal = 0;  ///< The greatest ratio, or with `isLeast` the least; 0 is none.
   bool isLeast = false;
   Unit unit = Unit::nanoseconds;
+  /// The power of the size that the floor is known to grow as, which tells the growth of ours from
+  /// the ratios: it is to be the same at most. None where the floor follows no power.
+  std::optional<int> floorPower = 1;
 };
 
 /// Puts the row into the table, under the size `state.range(0)`.
 void report(benchmark::State& state, const Row& row);
 
 /// Measures `ours`, less what `deducted` takes unless that is empty, beside `floor`, and reports
-/// them. One more run of `ours` is timed by the benchmark library, which fits a growth to it.
+/// them.
 void measureRow(benchmark::State& state, Row row, const Work& ours, const Work& floor,
                 const Work& deducted = nullptr);
 
-/// Applies the sizes of all homes to a benchmark that measures by itself, and asks for its growth.
+/// Applies the sizes of all homes to a benchmark that measures by itself.
 void everySize(benchmark::internal::Benchmark* benchmark);
-void everySizeWithoutGrowth(benchmark::internal::Benchmark* benchmark);
 /// The same up to 10,000 services: for what writes all of them to a disk first, or walks objects
 /// that no cache holds any more.
 void everySizeTo10000(benchmark::internal::Benchmark* benchmark);

@@ -3,13 +3,17 @@
 #include <array>
 #include <cstdio>
 #include <string>
+#include <utility>
 
+#include "Growth.h"
 #include "Measurement.h"
 
 namespace nidus {
 namespace {
 
 constexpr int kNameWidth = 52;
+/// Two sizes tell little.
+constexpr std::size_t kFewestSizes = 3;
 
 std::string quantity(double value, Unit unit) {
   std::array<char, 32> text{};
@@ -27,23 +31,8 @@ std::string quantity(double value, Unit unit) {
   return text.data();
 }
 
-std::string formOf(benchmark::BigO growth) {
-  switch (growth) {
-    case benchmark::o1:
-      return "O(1)";
-    case benchmark::oLogN:
-      return "O(log N)";
-    case benchmark::oN:
-      return "O(N)";
-    case benchmark::oNLogN:
-      return "O(N log N)";
-    case benchmark::oNSquared:
-      return "O(N^2)";
-    case benchmark::oNCubed:
-      return "O(N^3)";
-    default:
-      return "?";
-  }
+double ratioIn(const benchmark::BenchmarkReporter::Run& run) {
+  return run.counters.at("ours") / run.counters.at("floor");
 }
 
 }  // namespace
@@ -56,27 +45,28 @@ bool ResultTable::ReportContext(const Context& /*context*/) {
 
 void ResultTable::ReportRuns(const std::vector<Run>& runs) {
   for (const Run& run : runs) {
+    if (!rowsOfKind_.empty() && run.family_index != rowsOfKind_.front().family_index) printGrowth();
     if (run.error_occurred) {
       std::printf("%-*s %s\n", kNameWidth, run.benchmark_name().c_str(), run.error_message.c_str());
-    } else if (run.report_big_o) {
-      printGrowth(run);
-    } else if (run.report_rms) {
-      std::printf(", %.0f %% off\n", 100 * run.GetAdjustedRealTime());
     } else {
       printRow(run);
+      rowsOfKind_.push_back(run);
     }
   }
   std::fflush(stdout);
 }
 
-void ResultTable::Finalize() { std::printf("%d of %d goals met, %d rows\n", met_, goals_, rows_); }
+void ResultTable::Finalize() {
+  printGrowth();
+  std::printf("%d of %d goals met, %d rows\n", met_, goals_, rows_);
+}
 
 void ResultTable::printRow(const Run& run) {
   const double ours = run.counters.at("ours");
   const double floor = run.counters.at("floor");
   const double goal = run.counters.at("goal");
   const auto unit = static_cast<Unit>(static_cast<int>(run.counters.at("unit")));
-  const double ratio = ours / floor;
+  const double ratio = ratioIn(run);
   ++rows_;
   std::printf("%-*s %7lld %13s %13s %8.2f ", kNameWidth, run.report_label.c_str(),
               static_cast<long long>(run.complexity_n), quantity(ours, unit).c_str(),
@@ -86,14 +76,29 @@ void ResultTable::printRow(const Run& run) {
     return;
   }
   const bool isMet = run.counters.at("isLeast") != 0 ? ratio >= goal : ratio <= goal;
-  ++goals_;
-  met_ += isMet ? 1 : 0;
-  std::printf("%6.1f  %s\n", goal, isMet ? "yes" : "NO");
+  std::printf("%6.1f  %s\n", goal, count(isMet));
 }
 
-void ResultTable::printGrowth(const Run& run) {
-  std::printf("%-*s growth: %s times %s", kNameWidth, "", formOf(run.complexity).c_str(),
-              quantity(run.GetAdjustedRealTime(), Unit::nanoseconds).c_str());
+void ResultTable::printGrowth() {
+  const std::vector<Run> rows = std::exchange(rowsOfKind_, {});
+  if (rows.size() < kFewestSizes || !rows.front().counters.contains("floorPower")) return;
+  const auto floor = static_cast<int>(rows.front().counters.at("floorPower"));
+  std::vector<ValueAtSize> ratios;
+  ratios.reserve(rows.size());
+  for (const Run& row : rows) {
+    ratios.push_back({static_cast<double>(row.complexity_n), ratioIn(row)});
+  }
+  const double exponent = floor + exponentOf(ratios);
+  const int power = powerNextTo(exponent);
+  std::printf("%-*s growth beside the floor: %-6s (N to the %.2f) %7s  %s\n", kNameWidth, "",
+              textOfPower(power).c_str(), exponent, textOfPower(floor).c_str(),
+              count(power <= floor));
+}
+
+const char* ResultTable::count(bool isMet) {
+  ++goals_;
+  met_ += isMet ? 1 : 0;
+  return isMet ? "yes" : "NO";
 }
 
 }  // namespace nidus

@@ -62,10 +62,10 @@ void BM_MemoryGrowth(benchmark::State& state, Row row) {
 
 BENCHMARK_CAPTURE(BM_Memory, 12, 12,
                   Row{.name = "memory of a command, names of 12", .goal = 1, .unit = Unit::bytes})
-    ->Apply(everySizeWithoutGrowth);
+    ->Apply(everySize);
 BENCHMARK_CAPTURE(BM_Memory, 24, 24,
                   Row{.name = "memory of a command, names of 24", .goal = 1, .unit = Unit::bytes})
-    ->Apply(everySizeWithoutGrowth);
+    ->Apply(everySize);
 BENCHMARK_CAPTURE(BM_MemoryGrowth, ten_commands,
                   Row{.name = "memory left by ten commands", .goal = 1, .unit = Unit::bytes})
     ->Arg(1'000)

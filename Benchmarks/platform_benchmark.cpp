@@ -148,7 +148,7 @@ void BM_WriteBatch(benchmark::State& state) {
   { const Accessories written(home, floor.file(kDatabaseFile)); }
   Database database(floor.file(kDatabaseFile), std::chrono::seconds(1));
   ValueWriter writer(database);
-  Row row{.name = "batch of writes / its commit to disk"};
+  Row row{.name = "batch of writes / its commit to disk", .floorPower = std::nullopt};
   row.ours = row.floor = std::numeric_limits<double>::infinity();
   for (auto _ : state) {
     for (std::size_t round = 0; round < kDiskRounds; ++round) {

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <atomic>
 #include <chrono>
+#include <optional>
 #include <thread>
 #include <vector>
 
@@ -89,7 +90,8 @@ BENCHMARK_CAPTURE(BM_TwoThreads, one_target,
                   Row{.name = "commands per ms of two threads",
                       .goal = 1.7,
                       .isLeast = true,
-                      .unit = Unit::commands})
+                      .unit = Unit::commands,
+                      .floorPower = std::nullopt})
     ->RangeMultiplier(10)
     ->Range(10, 1'000)
     ->Iterations(1)
