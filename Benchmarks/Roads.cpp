@@ -2,7 +2,7 @@
 
 #include <array>
 #include <cstdio>
-#include <cstdlib>
+#include <cstring>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -26,37 +26,43 @@ extern "C" __attribute__((noinline)) std::size_t nidusCountedRoad(
 namespace nidus {
 namespace {
 
-constexpr std::size_t kServices = 1'000;
 constexpr std::size_t kNameLength = 24;
-constexpr HomeShape kShape{.services = kServices, .nameLength = kNameLength, .hasScene = true};
+/// Homes of a multiple of so many services have no room, zone or group that is not full.
+constexpr std::size_t kFullHomes = 100;
 
 /// Gives the number of things that it came by.
 using Road = std::function<std::size_t()>;
 
-/// How a road is prepared, and what it has to come by.
+/// How a road is prepared, and how many things it has to come by in a home of so many services.
 struct RoadPlan {
   std::string_view name;
-  Road (*prepare)();
-  std::size_t expected;
+  Road (*prepare)(const HomeShape& shape);
+  std::size_t (*expected)(std::size_t services);
 };
 
-std::shared_ptr<BenchmarkPlatform> makePlatform() {
-  return std::make_shared<BenchmarkPlatform>(BenchmarkPlatform::Kind::embedded, kShape);
+std::shared_ptr<BenchmarkPlatform> makePlatform(const HomeShape& shape) {
+  return std::make_shared<BenchmarkPlatform>(BenchmarkPlatform::Kind::embedded, shape);
 }
 
-Road prepareCommand(std::shared_ptr<const VAHACommand> request) {
-  return [platform = makePlatform(), request = std::move(request)] {
+Road prepareCommand(const HomeShape& shape, std::shared_ptr<const VAHACommand> request) {
+  return [platform = makePlatform(shape), request = std::move(request)] {
     return platform->perform(*request);
   };
 }
 
-Road prepareSnapshot() {
-  const auto platform = makePlatform();
+Road prepareSnapshot(const HomeShape& shape) {
+  const auto platform = makePlatform(shape);
   return [platform, gather = platform->gather()] { return gather->gatherNidusObjects().size(); };
 }
 
-Road prepareFilter() {
-  const auto platform = makePlatform();
+Road prepareSearch(const HomeShape& shape, std::shared_ptr<const VAHASearchCriteriaFilter> filter) {
+  const auto platform = makePlatform(shape);
+  return [platform, filter = std::move(filter), command = platform->commandWithSnapshot()] {
+    return command->objectsWithSearchFilter_inHome(*filter, filter->homeName())->size();
+  };
+}
+
+Road prepareFilter(const HomeShape& shape) {
   const auto filter = std::make_shared<VAHASearchCriteriaFilter>();
   filter->setHomeName(numberedName("Home", 0, kNameLength));
   filter->setZoneName(numberedName("Zone", 0, kNameLength));
@@ -64,22 +70,67 @@ Road prepareFilter() {
   filter->setGroupName(numberedName("Group", 0, kNameLength));
   filter->setServiceType("LIGHT");
   filter->setAttribute("BRIGHTNESS");
-  return [platform, filter, command = platform->commandWithSnapshot()] {
-    return command->objectsWithSearchFilter_inHome(*filter, filter->homeName())->size();
-  };
+  return prepareSearch(shape, filter);
 }
 
-Road prepareBrightness(std::string_view actionType) {
-  return prepareCommand(std::make_shared<BrightnessRequest>(actionType, nullptr));
+/// Searches by one field alone.
+Road prepareSearchBy(void (VAHASearchCriteriaFilter::*set)(NDString), const NDString& name,
+                     const HomeShape& shape) {
+  const auto filter = std::make_shared<VAHASearchCriteriaFilter>();
+  (filter.get()->*set)(name);
+  return prepareSearch(shape, filter);
 }
 
-Road prepareRead() { return prepareBrightness(VAHAActionTypeGETValue); }
-Road prepareWrite() { return prepareBrightness(VAHAActionTypeSETValue); }
-Road prepareRaise() { return prepareBrightness(VAHAActionTypeINCREASEValue); }
-Road prepareScene() { return prepareCommand(std::make_shared<SceneRequest>(kSceneName)); }
+/// The name of the last thing of which there is one for so many services.
+NDString lastName(const char* word, std::size_t servicesEach, const HomeShape& shape) {
+  return numberedName(word, shape.services / servicesEach - 1, shape.nameLength);
+}
 
-Road prepareSync() {
-  return [platform = makePlatform(), sync = std::make_shared<BenchmarkSync>()] {
+Road prepareFilterByRoom(const HomeShape& shape) {
+  return prepareSearchBy(&VAHASearchCriteriaFilter::setRoomName, lastName("Room", 10, shape),
+                         shape);
+}
+Road prepareFilterByZone(const HomeShape& shape) {
+  return prepareSearchBy(&VAHASearchCriteriaFilter::setZoneName, lastName("Zone", 50, shape),
+                         shape);
+}
+Road prepareFilterByGroup(const HomeShape& shape) {
+  return prepareSearchBy(&VAHASearchCriteriaFilter::setGroupName, lastName("Group", 20, shape),
+                         shape);
+}
+Road prepareFilterByName(const HomeShape& shape) {
+  return prepareSearchBy(&VAHASearchCriteriaFilter::setServiceName,
+                         lastName(kServiceWord, 1, shape), shape);
+}
+/// Looks for a name with an accent by the name without.
+Road prepareFilterByAccent(const HomeShape& shape) {
+  HomeShape plain = shape;
+  plain.nameLength -= std::strlen(kAccentedServiceWord) - std::strlen(kServiceWord);
+  HomeShape accented = shape;
+  accented.hasAccents = true;
+  return prepareSearchBy(&VAHASearchCriteriaFilter::setServiceName,
+                         lastName(kServiceWord, 1, plain), accented);
+}
+
+Road prepareBrightness(const HomeShape& shape, std::string_view actionType) {
+  return prepareCommand(shape, std::make_shared<BrightnessRequest>(actionType, nullptr));
+}
+
+Road prepareRead(const HomeShape& shape) {
+  return prepareBrightness(shape, VAHAActionTypeGETValue);
+}
+Road prepareWrite(const HomeShape& shape) {
+  return prepareBrightness(shape, VAHAActionTypeSETValue);
+}
+Road prepareRaise(const HomeShape& shape) {
+  return prepareBrightness(shape, VAHAActionTypeINCREASEValue);
+}
+Road prepareScene(const HomeShape& shape) {
+  return prepareCommand(shape, std::make_shared<SceneRequest>(kSceneName));
+}
+
+Road prepareSync(const HomeShape& shape) {
+  return [platform = makePlatform(shape), sync = std::make_shared<BenchmarkSync>()] {
     sync->begin(*platform);
     const std::size_t entities = sync->pullAll();
     sync->end();
@@ -88,9 +139,9 @@ Road prepareSync() {
 }
 
 /// From the document to the database.
-Road prepareImport() {
+Road prepareImport(const HomeShape& shape) {
   std::ostringstream document;
-  writeHomeDocument(document, {benchmarkHome(kShape)}, true);
+  writeHomeDocument(document, {benchmarkHome(shape)}, true);
   return [text = document.str(),
           store = std::shared_ptr<HomeStore>(std::move(*HomeStore::open(std::nullopt)))] {
     std::istringstream in(text);
@@ -101,30 +152,55 @@ Road prepareImport() {
 }
 
 /// Services, rooms, zones, groups, the home and its scene.
-constexpr std::size_t kRecords = kServices + kServices / 10 + kServices / 50 + kServices / 20 + 2;
+constexpr std::size_t allRecords(std::size_t services) {
+  return services + services / 10 + services / 50 + services / 20 + 2;
+}
+constexpr std::size_t allServices(std::size_t services) { return services; }
+template <std::size_t number>
+constexpr std::size_t always(std::size_t /*services*/) {
+  return number;
+}
 
-constexpr std::array kPlans = {
-    RoadPlan{"snapshot", prepareSnapshot, kRecords}, RoadPlan{"filter", prepareFilter, 10},
-    RoadPlan{"read", prepareRead, kServices},        RoadPlan{"write", prepareWrite, kServices},
-    RoadPlan{"raise", prepareRaise, kServices},      RoadPlan{"scene", prepareScene, 1},
-    RoadPlan{"sync", prepareSync, kRecords},         RoadPlan{"import", prepareImport, kServices}};
+constexpr std::array kPlans = {RoadPlan{"snapshot", prepareSnapshot, allRecords},
+                               RoadPlan{"filter", prepareFilter, always<10>},
+                               RoadPlan{"filter-by-room", prepareFilterByRoom, always<10>},
+                               RoadPlan{"filter-by-zone", prepareFilterByZone, always<50>},
+                               RoadPlan{"filter-by-group", prepareFilterByGroup, always<10>},
+                               RoadPlan{"filter-by-name", prepareFilterByName, always<1>},
+                               RoadPlan{"filter-by-accent", prepareFilterByAccent, always<1>},
+                               RoadPlan{"read", prepareRead, allServices},
+                               RoadPlan{"write", prepareWrite, allServices},
+                               RoadPlan{"raise", prepareRaise, allServices},
+                               RoadPlan{"scene", prepareScene, always<1>},
+                               RoadPlan{"sync", prepareSync, allRecords},
+                               RoadPlan{"import", prepareImport, allServices}};
 
-/// Goes a road, and says so when it leads somewhere else.
-bool arrives(const RoadPlan& plan, std::size_t found) {
-  if (found == plan.expected) return true;
+/// Says so when a road leads somewhere else.
+bool arrives(const RoadPlan& plan, std::size_t services, std::size_t found) {
+  const std::size_t expected = plan.expected(services);
+  if (found == expected) return true;
   std::fprintf(stderr, "NidusBenchmarks: %s comes by %zu things, not by %zu\n",
-               std::string(plan.name).c_str(), found, plan.expected);
+               std::string(plan.name).c_str(), found, expected);
   return false;
+}
+
+bool go(const RoadPlan& plan, std::size_t services) {
+  seedRandomSource();
+  const Road road =
+      plan.prepare({.services = services, .nameLength = kNameLength, .hasScene = true});
+  return arrives(plan, services, road()) && arrives(plan, services, nidusCountedRoad(road));
 }
 
 }  // namespace
 
-bool goRoad(std::string_view name) {
+bool goRoad(std::string_view name, std::size_t services) {
+  if (services == 0 || services % kFullHomes != 0) {
+    std::fprintf(stderr, "NidusBenchmarks: the services of a road are a multiple of %zu\n",
+                 kFullHomes);
+    return false;
+  }
   for (const RoadPlan& plan : kPlans) {
-    if (plan.name != name) continue;
-    seedRandomSource();
-    const Road road = plan.prepare();
-    return arrives(plan, road()) && arrives(plan, nidusCountedRoad(road));
+    if (plan.name == name) return go(plan, services);
   }
   std::fprintf(stderr, "NidusBenchmarks: no road is called %s\n", std::string(name).c_str());
   return false;

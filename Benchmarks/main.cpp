@@ -9,14 +9,30 @@
 #include "ResultTable.h"
 #include "Roads.h"
 
+namespace {
+
+constexpr std::string_view kRowTime = "--row_ms=";
+constexpr std::string_view kRoad = "--road=";
+constexpr std::string_view kServices = "--services=";
+
+bool asksForRoad(int argc, char** argv) {
+  return (argc == 2 || (argc == 3 && std::string_view(argv[2]).starts_with(kServices))) &&
+         std::string_view(argv[1]).starts_with(kRoad);
+}
+
+bool goRoadAskedFor(int argc, char** argv) {
+  const std::size_t services =
+      argc == 3 ? std::strtoul(argv[2] + kServices.size(), nullptr, 10) : nidus::kServicesOfRoad;
+  return nidus::goRoad(argv[1] + kRoad.size(), services);
+}
+
+}  // namespace
+
 // Prints the table of all rows, or of those that --benchmark_filter names; --row_ms=N says for how
-// long each row is repeated. --road=NAME goes one road whose instructions are counted.
+// long each row is repeated. --road=NAME [--services=N] goes one road whose instructions are
+// counted.
 int main(int argc, char** argv) {
-  constexpr std::string_view kRowTime = "--row_ms=";
-  constexpr std::string_view kRoad = "--road=";
-  if (argc == 2 && std::string_view(argv[1]).starts_with(kRoad)) {
-    return nidus::goRoad(argv[1] + kRoad.size()) ? 0 : 1;
-  }
+  if (asksForRoad(argc, argv)) return goRoadAskedFor(argc, argv) ? 0 : 1;
   benchmark::Initialize(&argc, argv);
   for (int i = 1; i < argc; ++i) {
     const std::string_view argument = argv[i];
