@@ -16,7 +16,7 @@ VAHAValue::~VAHAValue() = default;
 
 NDDictionary VAHAValue::dictionary() const {
   NDDictionary form;
-  form.reserve(2);
+  form.reserve(units_ ? 2 : 1);
   addValue(form);
   form.setIfPresent("units", units_);
   return form;

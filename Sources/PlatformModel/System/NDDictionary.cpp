@@ -3,28 +3,38 @@
 #include <algorithm>
 
 namespace nidus {
+namespace {
+
+auto entryIn(auto& entries, std::string_view key) noexcept {
+  return std::find_if(entries.begin(), entries.end(),
+                      [key](const auto& entry) { return entry.first == key; });
+}
+
+}  // namespace
 
 void NDDictionary::reserve(std::size_t count) { entries_.reserve(count); }
 
-void NDDictionary::set(std::string_view key, NDDictionaryValue value) {
-  const auto entry = std::find_if(entries_.begin(), entries_.end(),
-                                  [key](const Entry& candidate) { return candidate.first == key; });
+template <class Plain>
+void NDDictionary::setFrom(std::string_view key, Plain&& plain) {
+  const auto entry = entryIn(entries_, key);
   if (entry == entries_.end()) {
-    entries_.emplace_back(key, std::move(value));
+    entries_.emplace_back(key, std::forward<Plain>(plain));
   } else {
-    entry->second = std::move(value);
+    entry->second = NDDictionaryValue(std::forward<Plain>(plain));
   }
+}
+
+void NDDictionary::set(std::string_view key, NDDictionaryValue value) {
+  setFrom(key, std::move(value));
 }
 
 void NDDictionary::setIfPresent(std::string_view key, const NDString& text) {
-  if (text) set(key, NDDictionaryValue(text));
+  if (text) setFrom(key, text);
 }
 
 const NDDictionaryValue* NDDictionary::find(std::string_view key) const noexcept {
-  for (const Entry& entry : entries_) {
-    if (entry.first == key) return &entry.second;
-  }
-  return nullptr;
+  const auto entry = entryIn(entries_, key);
+  return entry == entries_.end() ? nullptr : &entry->second;
 }
 
 bool NDDictionary::empty() const noexcept { return entries_.empty(); }
