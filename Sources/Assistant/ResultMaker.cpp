@@ -56,6 +56,15 @@ bool fillLimit(VAHAActionResult& result, const VAHAAction& action,
   return isAttributeValueEqual(action.value(), result.resultValue());
 }
 
+/// Says whether both are the same boolean or the same integer. Floats that are equal may be told
+/// differently, such as 0 and -0.
+bool areSame(const NDValueRef& a, const NDValueRef& b) {
+  if (!a || !b) return false;
+  const bool areOfOneKind =
+      (a->isBoolean() && b->isBoolean()) || (a->isInteger() && b->isInteger());
+  return areOfOneKind && a->isEqual(*b);
+}
+
 }  // namespace
 
 /// What the mapper says of an action that has an attribute.
@@ -89,20 +98,32 @@ struct ResultMaker::Mapping {
   /// Fills in the cached value of `characteristic`.
   bool fillCurrentValue(VAHAActionResult& result, const VAHAAction& action,
                         const NDCharacteristic& characteristic) {
-    const auto& [native, reported, reportedName] = unitsFor(action);
-    const NDValueRef converted = convertValue(characteristic.value(), native, reported);
-    const NDValueRef assistantValue =
-        property(mapper, &NDNAPMetadata::mapToAssistantCharacteristicValue_name, converted,
-                 action.attribute());
-    result.setResultValue(setValue(assistantValue, format, reportedName));
+    NDValueRef value = characteristic.value();
+    if (!areSame(value, last)) {
+      told = toldValue(value, action);
+      last = std::move(value);
+    }
+    result.setResultValue(told);
     if (!action.value() || !isQuestion(action.actionType())) return true;
-    return isAttributeValueEqual(action.value(), result.resultValue());
+    return isAttributeValueEqual(action.value(), told);
+  }
+
+  /// The assistant's value of what a characteristic holds.
+  VAHAValueRef toldValue(const NDValueRef& value, const VAHAAction& action) {
+    const auto& [native, reported, reportedName] = unitsFor(action);
+    const NDValueRef converted = convertValue(value, native, reported);
+    return setValue(property(mapper, &NDNAPMetadata::mapToAssistantCharacteristicValue_name,
+                             converted, action.attribute()),
+                    format, reportedName);
   }
 
   const std::shared_ptr<NDNAPMetadata> mapper;
   const NDString type;         ///< Of the characteristic that a result tells of.
   const NDString format;       ///< Of its values.
   std::optional<Units> units;  ///< None until the first value.
+  // Services that follow each other mostly hold the same value: most lights of a home are off.
+  NDValueRef last;
+  VAHAValueRef told;  ///< The assistant's value of `last`.
 };
 
 ResultMaker::ResultMaker(VAHAActionRef action, NDString serviceType)

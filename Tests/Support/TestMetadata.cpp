@@ -121,7 +121,8 @@ NDValueRef TestMetadata::mapFromAssistantCharacteristicValue_name(const NDValueR
 
 NDValueRef TestMetadata::mapToAssistantCharacteristicValue_name(const NDValueRef& value,
                                                                 const NDString& name) const {
-  if (!value || attributeOf(name).name != "CLIMATE_MODE" || !value->isNumber()) return value;
+  if (!value || attributeOf(name).name != "CLIMATE_MODE") return value;
+  if (value->isText() || value->isBoolean()) return value;
   const auto place = static_cast<std::size_t>(value->integerValue());
   return place < kModes.size() ? NDValue::text(kModes[place]) : value;
 }
