@@ -36,7 +36,7 @@ class ListIndex {
   ListIndex() = default;
 
  private:
-  static constexpr std::size_t kShortList = 8;
+  static constexpr std::size_t kShortList = 32;
   static constexpr int kWalks = 4;
 
   // The list is held, so no other one can begin at the same place.

@@ -1,6 +1,7 @@
 #include "Assistant/ServiceLookUp.h"
 
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "Assistant/ObjectLookUp.h"
@@ -23,7 +24,7 @@ NDArray<NDService> twins(int count) {
 }
 
 TEST(ListIndexTest, FindsTheFirstAsAWalkDoes) {
-  for (const int count : {0, 1, 8, 9, 60}) {
+  for (const int count : {0, 1, 32, 33, 60}) {
     SCOPED_TRACE(count);
     const NDArray<NDService> list = twins(count);
     Index index;
@@ -53,6 +54,21 @@ TEST(ListIndexTest, AnotherListTakesThePlace) {
   EXPECT_FALSE(index.find({}, 7));
   EXPECT_EQ(index.find(former, 7), former[14]);
 }
+
+/// A home that counts how often it is asked for its UUID.
+class CountedHome final : public TestHome {
+ public:
+  using TestHome::TestHome;
+  [[nodiscard]] const NDUUID& uuid() const override {
+    ++asked_;
+    return TestHome::uuid();
+  }
+  /// How often since the last call.
+  int takeAsked() const { return std::exchange(asked_, 0); }
+
+ private:
+  mutable int asked_ = 0;
+};
 
 /// Looks for many services in homes that are too great for walks.
 class ServiceLookUpTest : public PlatformTest {
@@ -90,6 +106,25 @@ class ServiceLookUpTest : public PlatformTest {
     }
     return found;
   }
+  /// How often the first of `count` homes is asked for its UUID by each of six look-ups of what is
+  /// in the last one.
+  std::vector<int> askedOfFirstAmong(std::uint32_t count) {
+    const auto first = std::make_shared<CountedHome>(testUUID(0, 8), "Cabin", false);
+    NDArray<NDHome> homes{first};
+    for (std::uint32_t i = 1; i < count; ++i) {
+      const auto home = std::make_shared<TestHome>(testUUID(i, 8), "Cottage", false);
+      append<NDHome>(homes, HomeBuilder(home).light("Lamp").build());
+    }
+    const auto last = homes[count - 1]->accessories()[0]->services()[0];
+    setHomes(std::move(homes));
+    std::vector<int> asked;
+    for (int i = 0; i < 6; ++i) {
+      first->takeAsked();
+      EXPECT_EQ(lookUp_.service(recordOf(*last)), last);
+      asked.push_back(first->takeAsked());
+    }
+    return asked;
+  }
   static void setHomes(NDArray<NDHome> homes) {
     platform().lastManager()->setHomes(std::move(homes));
   }
@@ -119,14 +154,23 @@ TEST_F(ServiceLookUpTest, AccessoriesOfTwoHomesAreKeptApart) {
 
 TEST_F(ServiceLookUpTest, FirstOfTwoHomesIsFound) {
   NDArray<NDHome> homes;
-  for (int i = 0; i < 20; ++i) append<NDHome>(homes, greatHome("Cabin " + std::to_string(i / 2)));
+  for (int i = 0; i < 36; ++i) append<NDHome>(homes, greatHome("Cabin " + std::to_string(i / 2)));
   setHomes(homes);
-  for (int i = 0; i < 20; ++i) {
+  for (int i = 0; i < 36; ++i) {
     const auto record =
         recordOf(*homes[static_cast<std::size_t>(i)]->accessories()[3]->services()[0]);
     const auto& first = homes[static_cast<std::size_t>(i) / 2 * 2];
     EXPECT_EQ(lookUp_.service(record), first->accessories()[3]->services()[0]);
   }
+}
+
+TEST_F(ServiceLookUpTest, FewHomesAreWalkedThroughAlways) {
+  EXPECT_EQ(askedOfFirstAmong(32), (std::vector<int>{1, 1, 1, 1, 1, 1}));
+}
+
+TEST_F(ServiceLookUpTest, ManyHomesGetATableAfterFourWalks) {
+  // The fifth look-up makes the table.
+  EXPECT_EQ(askedOfFirstAmong(33), (std::vector<int>{1, 1, 1, 1, 1, 0}));
 }
 
 TEST_F(ServiceLookUpTest, HomesOfTheMomentAreSearched) {
