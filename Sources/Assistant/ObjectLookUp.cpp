@@ -1,7 +1,6 @@
 #include "Assistant/ObjectLookUp.h"
 
 #include <algorithm>
-#include <array>
 #include <charconv>
 #include <cstdint>
 #include <optional>
@@ -17,13 +16,7 @@
 namespace nidus {
 namespace {
 
-constexpr auto kIsSeparator = [] {
-  std::array<bool, 256> isSeparator{};
-  for (const char c : {':', '&', '=', '?'}) isSeparator[static_cast<unsigned char>(c)] = true;
-  return isSeparator;
-}();
-
-constexpr bool isSeparator(char c) noexcept { return kIsSeparator[static_cast<unsigned char>(c)]; }
+constexpr bool isSeparator(char c) noexcept { return c == ':' || c == '&' || c == '=' || c == '?'; }
 
 /// Where the first token that equals `key` begins; `npos` without one. Tokens are what stands
 /// between separators, and a key has none.
