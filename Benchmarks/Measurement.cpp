@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cstdint>
 #include <limits>
+#include <map>
 
 namespace nidus {
 namespace {
@@ -14,6 +15,11 @@ constexpr double kNanosecondsPerSecond = 1e9;
 constexpr int kFewestRounds = 5;
 
 std::chrono::milliseconds rowTime(300);
+
+/// What the floor took at each size, in seconds; of the kind of rows that is being measured.
+std::map<std::int64_t, double> floorTimes;
+
+double floorTimeAt(benchmark::IterationCount size) { return floorTimes.at(size); }
 
 double processorTime() {
   timespec time{};
@@ -62,6 +68,7 @@ std::vector<double> leastNanoseconds(const std::vector<Work>& pieces) {
 void report(benchmark::State& state, const Row& row) {
   state.SetIterationTime(row.ours / kNanosecondsPerSecond);
   state.SetComplexityN(state.range(0));
+  floorTimes[state.range(0)] = row.floor / kNanosecondsPerSecond;
   state.SetLabel(row.name);
   state.counters["ours"] = row.ours;
   state.counters["floor"] = row.floor;
@@ -85,10 +92,12 @@ void measureRow(benchmark::State& state, Row row, const Work& ours, const Work& 
 
 void everySize(benchmark::internal::Benchmark* benchmark) {
   benchmark->RangeMultiplier(10)->Range(10, 100'000)->Iterations(1)->UseManualTime();
+  benchmark->Complexity(floorTimeAt);
 }
 
 void everySizeTo10000(benchmark::internal::Benchmark* benchmark) {
   benchmark->RangeMultiplier(10)->Range(10, 10'000)->Iterations(1)->UseManualTime();
+  benchmark->Complexity(floorTimeAt);
 }
 
 }  // namespace nidus

@@ -46,7 +46,9 @@ void report(benchmark::State& state, const Row& row);
 void measureRow(benchmark::State& state, Row row, const Work& ours, const Work& floor,
                 const Work& deducted = nullptr);
 
-/// Applies the sizes of all homes to a benchmark that measures by itself.
+/// Applies the sizes of all homes to a benchmark that measures by itself. The benchmark library
+/// fits ours to what the floor took at the same sizes: it grows as the floor does where it fits
+/// well.
 void everySize(benchmark::internal::Benchmark* benchmark);
 /// The same up to 10,000 services: for what writes all of them to a disk first, or walks objects
 /// that no cache holds any more.

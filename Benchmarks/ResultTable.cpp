@@ -48,6 +48,11 @@ void ResultTable::ReportRuns(const std::vector<Run>& runs) {
     if (!rowsOfKind_.empty() && run.family_index != rowsOfKind_.front().family_index) printGrowth();
     if (run.error_occurred) {
       std::printf("%-*s %s\n", kNameWidth, run.benchmark_name().c_str(), run.error_message.c_str());
+    } else if (run.report_big_o) {
+      std::printf("%-*s fitted to the floor: %.2f times", kNameWidth, "",
+                  run.real_accumulated_time);
+    } else if (run.report_rms) {
+      std::printf(", %.0f %% off\n", 100 * run.GetAdjustedRealTime());
     } else {
       printRow(run);
       rowsOfKind_.push_back(run);
