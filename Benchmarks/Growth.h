@@ -11,11 +11,11 @@ struct ValueAtSize {
   double value = 0;
 };
 
-/// The power of the size that the values grow as: the slope of their logarithms over that of the
+/// The power of the size that the values grow as: the slope of their logarithms over those of the
 /// sizes, by least squares, so that each size counts alike. `values` has at least two sizes.
 ///
-/// A logarithm of the size as a further factor adds 0.17 from 10 to 100,000. So do the caches that
-/// end one after the other on the way, which is why no form with a logarithm is told apart here.
+/// From 1,000 to 100,000 a logarithm of the size as a further factor adds 0.11. So do caches that
+/// end on the way, which is why no form with a logarithm is told apart here.
 [[nodiscard]] double exponentOf(const std::vector<ValueAtSize>& values);
 
 /// The whole power next to `exponent`; one below 0 is 0.

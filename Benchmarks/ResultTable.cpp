@@ -1,7 +1,9 @@
 #include "ResultTable.h"
 
+#include <algorithm>
 #include <array>
 #include <cstdio>
+#include <iterator>
 #include <string>
 #include <utility>
 
@@ -12,8 +14,8 @@ namespace nidus {
 namespace {
 
 constexpr int kNameWidth = 52;
-/// Two sizes tell little.
-constexpr std::size_t kFewestSizes = 3;
+/// The greatest ones: in small homes, what a road costs whatever the size hides its growth.
+constexpr std::ptrdiff_t kSizesOfGrowth = 3;
 
 std::string quantity(double value, Unit unit) {
   std::array<char, 32> text{};
@@ -86,13 +88,13 @@ void ResultTable::printRow(const Run& run) {
 
 void ResultTable::printGrowth() {
   const std::vector<Run> rows = std::exchange(rowsOfKind_, {});
-  if (rows.size() < kFewestSizes || !rows.front().counters.contains("floorPower")) return;
+  if (std::ssize(rows) < kSizesOfGrowth || !rows.front().counters.contains("floorPower")) return;
   const auto floor = static_cast<int>(rows.front().counters.at("floorPower"));
   std::vector<ValueAtSize> ratios;
-  ratios.reserve(rows.size());
-  for (const Run& row : rows) {
-    ratios.push_back({static_cast<double>(row.complexity_n), ratioIn(row)});
-  }
+  std::transform(rows.end() - kSizesOfGrowth, rows.end(), std::back_inserter(ratios),
+                 [](const Run& row) {
+                   return ValueAtSize{static_cast<double>(row.complexity_n), ratioIn(row)};
+                 });
   const double exponent = floor + exponentOf(ratios);
   const int power = powerNextTo(exponent);
   std::printf("%-*s growth beside the floor: %-6s (N to the %.2f) %7s  %s\n", kNameWidth, "",
