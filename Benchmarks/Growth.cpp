@@ -6,18 +6,15 @@
 namespace nidus {
 
 double exponentOf(const std::vector<ValueAtSize>& values) {
-  double sizes = 0;
-  double logarithms = 0;
-  for (const auto& [size, value] : values) {
-    sizes += std::log(size);
-    logarithms += std::log(value);
+  double middle = 0;
+  for (const auto& each : values) {
+    middle += std::log(each.size) / static_cast<double>(values.size());
   }
-  const auto count = static_cast<double>(values.size());
   double products = 0;
   double squares = 0;
   for (const auto& [size, value] : values) {
-    const double distance = std::log(size) - sizes / count;
-    products += distance * (std::log(value) - logarithms / count);
+    const double distance = std::log(size) - middle;
+    products += distance * std::log(value);
     squares += distance * distance;
   }
   return products / squares;

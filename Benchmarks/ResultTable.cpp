@@ -97,7 +97,7 @@ void ResultTable::printGrowth() {
                  });
   const double exponent = floor + exponentOf(ratios);
   const int power = powerNextTo(exponent);
-  std::printf("%-*s growth beside the floor: %-6s (N to the %.2f) %7s  %s\n", kNameWidth, "",
+  std::printf("%-*s growth beside floor: %-6s (exponent %5.2f) %5s  %s\n", kNameWidth, "",
               textOfPower(power).c_str(), exponent, textOfPower(floor).c_str(),
               count(power <= floor));
 }
