@@ -51,6 +51,7 @@ class ListsWith {
 template <class Predicate>
 ObjectList matching(const ObjectList& objects, const Predicate& matches) {
   ObjectList kept;
+  kept.reserve(objects.size());
   for (const HomeObjectRecord* object : objects) {
     if (matches(*object)) kept.push_back(object);
   }
