@@ -1,8 +1,10 @@
 #include <benchmark/benchmark.h>
+#include <malloc.h>
 
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
+#include <limits>
 #include <string_view>
 
 #include "Measurement.h"
@@ -26,6 +28,14 @@ bool goRoadAskedFor(int argc, char** argv) {
   return nidus::goRoad(argv[1] + kRoad.size(), services);
 }
 
+/// Memory that is given back to the system and taken again is the system's work, and whether a run
+/// does so hangs on what happens to lie at the end of the heap.
+void keepMemory() {
+  constexpr int kGreatestThreshold = 32 << 20;
+  mallopt(M_MMAP_THRESHOLD, kGreatestThreshold);
+  mallopt(M_TRIM_THRESHOLD, std::numeric_limits<int>::max());
+}
+
 }  // namespace
 
 // Prints the table of all rows, or of those that --benchmark_filter names; --row_ms=N says for how
@@ -33,6 +43,7 @@ bool goRoadAskedFor(int argc, char** argv) {
 // counted.
 int main(int argc, char** argv) {
   if (asksForRoad(argc, argv)) return goRoadAskedFor(argc, argv) ? 0 : 1;
+  keepMemory();
   benchmark::Initialize(&argc, argv);
   for (int i = 1; i < argc; ++i) {
     const std::string_view argument = argv[i];

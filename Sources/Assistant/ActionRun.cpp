@@ -8,6 +8,8 @@ namespace nidus {
 /// Results in the order in which they were made.
 class ActionRun::ResultList {
  public:
+  explicit ResultList(std::size_t expected) { results_.reserve(expected); }
+
   void append(std::shared_ptr<const VAHAActionResult> result) {
     const NDLock lock(mutex_);
     results_.push_back(std::move(result));
@@ -24,12 +26,12 @@ class ActionRun::ResultList {
 };
 
 ActionRun::ActionRun(std::shared_ptr<const NDAssistantCommand> command, VAHAActionRef action,
-                     NDString serviceType, VAHAReplyHandler handler)
+                     NDString serviceType, VAHAReplyHandler handler, std::size_t expected)
     : command_(std::move(command)),
       action_(std::move(action)),
       serviceType_(std::move(serviceType)),
       handler_(std::move(handler)),
-      results_(std::make_shared<ResultList>()),
+      results_(std::make_shared<ResultList>(expected)),
       // Nobody waits for this group, so any clock will do.
       group_(std::make_shared<NDWaitGroup>(std::make_shared<NDSystemClock>())) {}
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <memory>
 #include <string_view>
 #include <utility>
@@ -61,9 +62,9 @@ class ActionRun {
     std::shared_ptr<NDWaitGroup> group_;
   };
 
-  /// `command` is never null; the others may be.
+  /// `command` is never null; the others may be. Makes room for `expected` results.
   ActionRun(std::shared_ptr<const NDAssistantCommand> command, VAHAActionRef action,
-            NDString serviceType, VAHAReplyHandler handler);
+            NDString serviceType, VAHAReplyHandler handler, std::size_t expected);
   ~ActionRun();
 
   [[nodiscard]] const NDAssistantCommand& command() const { return *command_; }

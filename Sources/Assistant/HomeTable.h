@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <memory>
 #include <utility>
 #include <vector>
@@ -14,12 +15,15 @@ namespace nidus {
 /// which they were met, the items of each in the order in which they were added. Homes are not kept
 /// alive. Not synchronised.
 ///
-///     HomeTable<std::shared_ptr<NDCharacteristic>> table;
+///     HomeTable<std::shared_ptr<NDCharacteristic>> table(characteristics.size());
 ///     table.add(*characteristic, characteristic);
 ///     table.forEachHome([](const std::shared_ptr<NDHome>& home, auto items) { ... });
 template <class Item>
 class HomeTable {
  public:
+  /// Makes room for `expected` items of the home that is met first: mostly there is no other.
+  explicit HomeTable(std::size_t expected) : expected_(expected) {}
+
   /// Adds `item` to the home that holds `characteristic`; nothing happens when that home is gone.
   void add(const NDCharacteristic& characteristic, Item item) {
     const auto accessory = property(characteristic.service(), &NDService::accessory);
@@ -47,9 +51,12 @@ class HomeTable {
       const bool isSame = !entry.home.owner_before(home) && !home.owner_before(entry.home);
       if (isSame) return entry.items;
     }
-    return entries_.emplace_back(Entry{home, {}}).items;
+    auto& items = entries_.emplace_back(Entry{home, {}}).items;
+    items.reserve(std::exchange(expected_, 0));
+    return items;
   }
 
+  std::size_t expected_;  ///< 0 once a home was met.
   std::vector<Entry> entries_;
 };
 

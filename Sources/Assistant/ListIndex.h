@@ -26,8 +26,12 @@ class ListIndex {
   [[nodiscard]] std::shared_ptr<Element> find(const NDArray<Element>& list,
                                               const std::optional<Key>& key) {
     if (!key) return nullptr;
+    if (list.size() <= kShortList) return walkTo(*key, list);
     if (list.begin() != list_.begin()) *this = ListIndex(list);
-    if (list.size() <= kShortList || walks_ < kWalks) return walkTo(*key);
+    if (walks_ < kWalks) {
+      ++walks_;
+      return walkTo(*key, list);
+    }
     if (first_.empty()) fillTable();
     const auto found = first_.find(*key);
     return found == first_.end() ? nullptr : *found->second;
@@ -42,9 +46,8 @@ class ListIndex {
   // The list is held, so no other one can begin at the same place.
   explicit ListIndex(const NDArray<Element>& list) : list_(list) {}
 
-  std::shared_ptr<Element> walkTo(const Key& key) {
-    ++walks_;
-    for (const auto& element : list_) {
+  static std::shared_ptr<Element> walkTo(const Key& key, const NDArray<Element>& list) {
+    for (const auto& element : list) {
       if (std::invoke(keyOf, *element) == key) return element;
     }
     return nullptr;

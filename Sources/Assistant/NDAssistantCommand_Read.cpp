@@ -26,7 +26,7 @@ void batchDidRead(const ActionRun& run, const std::optional<NDError>& error,
 
 void readByHome(const std::shared_ptr<const ActionRun>& run,
                 const NDAssistantCommand::CharacteristicList& characteristics) {
-  HomeTable<std::shared_ptr<NDCharacteristic>> table;
+  HomeTable<std::shared_ptr<NDCharacteristic>> table(characteristics.size());
   for (const auto& characteristic : characteristics) table.add(*characteristic, characteristic);
   table.forEachHome(
       [&run](const std::shared_ptr<NDHome>& home, NDAssistantCommand::CharacteristicList batch) {
@@ -75,7 +75,8 @@ void NDAssistantCommand::handleGetActionTypes_serviceType_forObjects_completionH
                                                           handler);
     return;
   }
-  readByHome(std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler),
+  readByHome(std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler,
+                                         characteristics.size()),
              characteristics);
 }
 

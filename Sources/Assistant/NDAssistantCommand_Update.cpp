@@ -87,6 +87,7 @@ void HomeUpdate::didRead(const std::optional<NDError>& error, const Responses& r
   ActionRun::Answer answer(*run);
   ResultWriter results(*run);
   Writes writes;
+  writes.reserve(responses.size());
   const bool isUnlocked =
       visitUntilLocked(error, responses, [&](const NDCharacteristicResponse& response) {
         addWriteOrResult(writes, results, response);
@@ -152,7 +153,7 @@ void HomeUpdate::didWrite(const Responses& responses) const {
 void updateByHome(const std::shared_ptr<const ActionRun>& run,
                   const NDAssistantCommand::CharacteristicList& characteristics,
                   const NDString& writeType) {
-  HomeTable<std::shared_ptr<NDCharacteristic>> table;
+  HomeTable<std::shared_ptr<NDCharacteristic>> table(characteristics.size());
   ActionRun::ResultWriter results(*run);
   for (const auto& characteristic : characteristics) {
     const auto service = characteristic->service();
@@ -206,7 +207,8 @@ void NDAssistantCommand::handleUpdateActionTypes_serviceType_forObjects_completi
     reportOutcome_results_handler(VAHACommandOutcomeCOMMAND_FAILUREValue, std::nullopt, handler);
     return;
   }
-  updateByHome(std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler),
+  updateByHome(std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler,
+                                           characteristics.size()),
                characteristics, writeType);
 }
 

@@ -1,6 +1,8 @@
-#include <unordered_set>
+#include <cstddef>
+#include <utility>
 
 #include "Assistant/ActionRun.h"
+#include "Assistant/AddressTable.h"
 #include "Assistant/HomeTable.h"
 #include "Assistant/NDAssistantCommand.h"
 #include "Assistant/ObjectLookUp.h"
@@ -18,8 +20,14 @@ namespace {
 /// The characteristics that are to be written, each once and in the order in which they were met.
 class WriteTable {
  public:
+  explicit WriteTable(std::size_t greatestSize) : isKnown_(greatestSize) {
+    characteristics_.reserve(greatestSize);
+  }
+
   void add(const std::shared_ptr<NDCharacteristic>& characteristic) {
-    if (known_.insert(characteristic.get()).second) characteristics_.push_back(characteristic);
+    if (!std::exchange(isKnown_[characteristic.get()], true)) {
+      characteristics_.push_back(characteristic);
+    }
   }
 
   [[nodiscard]] const NDAssistantCommand::CharacteristicList& characteristics() const {
@@ -28,7 +36,7 @@ class WriteTable {
 
  private:
   NDAssistantCommand::CharacteristicList characteristics_;
-  std::unordered_set<const NDCharacteristic*> known_;
+  AddressTable<bool> isKnown_;
 };
 
 const HomeObjectRecord* firstScene(const NDAssistantCommand::ObjectList& objects) {
@@ -57,7 +65,7 @@ bool isToBeWritten(const NDCharacteristic& characteristic, const NDString& actio
 /// platform.
 WriteTable decideWrites(const ActionRun& run,
                         const NDAssistantCommand::CharacteristicList& characteristics) {
-  WriteTable table;
+  WriteTable table(characteristics.size());
   ActionRun::ResultWriter results(run);
   for (const auto& characteristic : characteristics) {
     if (!isWritable(*characteristic)) {
@@ -88,7 +96,7 @@ void batchDidWrite(const ActionRun& run, const std::optional<NDError>& error,
 void writeByHome(const std::shared_ptr<const ActionRun>& run, const WriteTable& writes,
                  const NDValueRef& setValue) {
   using Tuple = NDCharacteristicWriteRequestTuple;
-  HomeTable<Tuple> table;
+  HomeTable<Tuple> table(writes.characteristics().size());
   for (const auto& characteristic : writes.characteristics()) {
     table.add(*characteristic, Tuple::tupleWithCharacteristic_value(characteristic, setValue));
   }
@@ -131,7 +139,8 @@ void NDAssistantCommand::handleSetActionTypes_serviceType_forObjects_completionH
   const NDValueRef setValue =
       adjustSetValue(getValueOfType(valueType, action), valueType,
                      property(action->value(), &VAHAValue::units), attribute);
-  const auto run = std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler);
+  const auto run = std::make_shared<ActionRun>(shared_from_this(), action, serviceType, handler,
+                                               characteristics.size());
   writeByHome(run, decideWrites(*run, characteristics), setValue);
 }
 
