@@ -20,9 +20,7 @@ namespace {
 /// The characteristics that are to be written, each once and in the order in which they were met.
 class WriteTable {
  public:
-  explicit WriteTable(std::size_t greatestSize) : isKnown_(greatestSize) {
-    characteristics_.reserve(greatestSize);
-  }
+  explicit WriteTable(std::size_t greatestSize) : isKnown_(greatestSize) {}
 
   void add(const std::shared_ptr<NDCharacteristic>& characteristic) {
     if (!std::exchange(isKnown_[characteristic.get()], true)) {
