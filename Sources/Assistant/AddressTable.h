@@ -36,7 +36,7 @@ class AddressTable {
  private:
   struct Slot {
     const void* object = nullptr;
-    Value value;
+    Value value{};
   };
 
   /// Where the object is, or the free place that it would take. There always is one.

@@ -12,8 +12,8 @@
 namespace nidus {
 
 /// Makes the results of one action, one after the other. What the mapper says of the action is
-/// asked when the first result needs it, and holds for all. Not synchronised: each batch has its
-/// own.
+/// asked when the first result needs it, and holds for all. Results with the same value may share
+/// the object that holds it. Not synchronised: each batch has its own.
 ///
 ///     ResultMaker maker(action, serviceType);
 ///     for (const auto& response : responses) {

@@ -51,6 +51,9 @@ TEST(ListIndexTest, AnotherListTakesThePlace) {
   for (int number = 0; number < 30; ++number) {
     EXPECT_EQ(index.find(list, number), findInArrayByInstanceID(list, number));
   }
+  const NDArray<NDService> few = twins(20);
+  EXPECT_EQ(index.find(few, 7), few[14]);
+  EXPECT_EQ(index.find(list, 7), list[14]);
   EXPECT_FALSE(index.find({}, 7));
   EXPECT_EQ(index.find(former, 7), former[14]);
 }
@@ -168,7 +171,7 @@ TEST_F(ServiceLookUpTest, FewHomesAreWalkedThroughAlways) {
   EXPECT_EQ(askedOfFirstAmong(32), (std::vector<int>{1, 1, 1, 1, 1, 1}));
 }
 
-TEST_F(ServiceLookUpTest, ManyHomesGetATableAfterFourWalks) {
+TEST_F(ServiceLookUpTest, ManyHomesGetATable) {
   // The fifth look-up makes the table.
   EXPECT_EQ(askedOfFirstAmong(33), (std::vector<int>{1, 1, 1, 1, 1, 0}));
 }

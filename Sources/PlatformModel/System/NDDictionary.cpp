@@ -10,26 +10,27 @@ auto entryIn(auto& entries, std::string_view key) noexcept {
                       [key](const auto& entry) { return entry.first == key; });
 }
 
-}  // namespace
-
-void NDDictionary::reserve(std::size_t count) { entries_.reserve(count); }
-
+/// Makes a new value in its place: a reply has very many.
 template <class Plain>
-void NDDictionary::setFrom(std::string_view key, Plain&& plain) {
-  const auto entry = entryIn(entries_, key);
-  if (entry == entries_.end()) {
-    entries_.emplace_back(key, std::forward<Plain>(plain));
+void setIn(std::vector<NDDictionary::Entry>& entries, std::string_view key, Plain&& plain) {
+  const auto entry = entryIn(entries, key);
+  if (entry == entries.end()) {
+    entries.emplace_back(key, std::forward<Plain>(plain));
   } else {
     entry->second = NDDictionaryValue(std::forward<Plain>(plain));
   }
 }
 
+}  // namespace
+
+void NDDictionary::reserve(std::size_t count) { entries_.reserve(count); }
+
 void NDDictionary::set(std::string_view key, NDDictionaryValue value) {
-  setFrom(key, std::move(value));
+  setIn(entries_, key, std::move(value));
 }
 
 void NDDictionary::setIfPresent(std::string_view key, const NDString& text) {
-  if (text) setFrom(key, text);
+  if (text) setIn(entries_, key, text);
 }
 
 const NDDictionaryValue* NDDictionary::find(std::string_view key) const noexcept {

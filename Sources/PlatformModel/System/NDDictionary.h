@@ -39,10 +39,6 @@ class ND_EXPORT NDDictionary {
   friend ND_EXPORT bool operator==(const NDDictionary& a, const NDDictionary& b);
 
  private:
-  /// Makes the value in its place: a reply makes very many.
-  template <class Plain>
-  void setFrom(std::string_view key, Plain&& plain);
-
   std::vector<Entry> entries_;
 };
 
