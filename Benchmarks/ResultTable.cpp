@@ -1,9 +1,7 @@
 #include "ResultTable.h"
 
-#include <algorithm>
 #include <array>
 #include <cstdio>
-#include <iterator>
 #include <string>
 #include <utility>
 
@@ -14,8 +12,6 @@ namespace nidus {
 namespace {
 
 constexpr int kNameWidth = 52;
-/// The greatest ones: in small homes, what a road costs whatever the size hides its growth.
-constexpr std::ptrdiff_t kSizesOfGrowth = 3;
 
 std::string quantity(double value, Unit unit) {
   std::array<char, 32> text{};
@@ -55,7 +51,7 @@ void ResultTable::ReportRuns(const std::vector<Run>& runs) {
                   run.real_accumulated_time);
     } else if (run.report_rms) {
       std::printf(", %.0f %% off\n", 100 * run.GetAdjustedRealTime());
-    } else {
+    } else if (run.run_type == Run::RT_Iteration) {
       printRow(run);
       rowsOfKind_.push_back(run);
     }
@@ -88,14 +84,16 @@ void ResultTable::printRow(const Run& run) {
 
 void ResultTable::printGrowth() {
   const std::vector<Run> rows = std::exchange(rowsOfKind_, {});
-  if (std::ssize(rows) < kSizesOfGrowth || !rows.front().counters.contains("floorPower")) return;
-  const auto floor = static_cast<int>(rows.front().counters.at("floorPower"));
+  if (rows.empty() || !rows.front().counters.contains("floorPower")) return;
   std::vector<ValueAtSize> ratios;
-  std::transform(rows.end() - kSizesOfGrowth, rows.end(), std::back_inserter(ratios),
-                 [](const Run& row) {
-                   return ValueAtSize{static_cast<double>(row.complexity_n), ratioIn(row)};
-                 });
-  const double exponent = floor + exponentOf(ratios);
+  ratios.reserve(rows.size());
+  for (const Run& row : rows) {
+    ratios.push_back({static_cast<double>(row.complexity_n), ratioIn(row)});
+  }
+  const auto ratioExponent = exponentOf(ratios);
+  if (!ratioExponent) return;
+  const auto floor = static_cast<int>(rows.front().counters.at("floorPower"));
+  const double exponent = floor + *ratioExponent;
   const int power = powerNextTo(exponent);
   std::printf("%-*s growth beside floor: %-6s (exponent %5.2f) %5s  %s\n", kNameWidth, "",
               textOfPower(power).c_str(), exponent, textOfPower(floor).c_str(),

@@ -1,7 +1,9 @@
 #include <benchmark/benchmark.h>
 #include <malloc.h>
 
+#include <charconv>
 #include <chrono>
+#include <cstddef>
 #include <cstdio>
 #include <cstdlib>
 #include <limits>
@@ -22,9 +24,17 @@ bool asksForRoad(int argc, char** argv) {
          std::string_view(argv[1]).starts_with(kRoad);
 }
 
+/// The number that `text` is as a whole; 0, which is the size of no home, for anything else.
+std::size_t numberFrom(std::string_view text) {
+  std::size_t number = 0;
+  const char* const end = text.data() + text.size();
+  const auto [stop, error] = std::from_chars(text.data(), end, number);
+  return error == std::errc() && stop == end ? number : 0;
+}
+
 bool goRoadAskedFor(int argc, char** argv) {
   const std::size_t services =
-      argc == 3 ? std::strtoul(argv[2] + kServices.size(), nullptr, 10) : nidus::kServicesOfRoad;
+      argc == 3 ? numberFrom(argv[2] + kServices.size()) : nidus::kServicesOfRoad;
   return nidus::goRoad(argv[1] + kRoad.size(), services);
 }
 
