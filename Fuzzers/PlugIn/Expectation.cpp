@@ -27,6 +27,16 @@ std::string outcomeOf(std::int32_t code, bool isWrite) {
   return std::string(isReadOnly ? VAHAActionOutcomeREAD_ONLYValue : VAHAActionOutcomeFAILUREValue);
 }
 
+/// Says whether a limit of `target` is the same boolean as `value`: what is beyond a limit becomes
+/// the limit, whatever kind that is of.
+bool isBooleanLimit(const CharacteristicData& target, const NDValue& value) {
+  const auto isSame = [&value](const NDValueRef& limit) {
+    return limit && limit->isBoolean() && limit->isEqual(value);
+  };
+  return target.metadata &&
+         (isSame(target.metadata->minimumValue) || isSame(target.metadata->maximumValue));
+}
+
 /// Follows one command.
 class CallFollower {
  public:
@@ -109,13 +119,11 @@ class CallFollower {
     if (!value) return complain("An update writes nothing.");
     const bool isToggle =
         firstAction(*performance_.command)->actionType() == VAHAActionTypeTOGGLEValue;
-    if (value->isBoolean() != isToggle) {
-      const auto& metadata = model_.find(call.home, address)->metadata;
-      const bool isLimit =
-          metadata && (value == metadata->minimumValue || value == metadata->maximumValue);
-      if (isToggle || !isLimit) complain("An update writes a value of the wrong kind.");
+    const CharacteristicData& target = *model_.find(call.home, address);
+    if (value->isBoolean() != isToggle && (isToggle || !isBooleanLimit(target, *value))) {
+      complain("An update writes a value of the wrong kind.");
     }
-    if (!isToggle) checkWithinLimits(*model_.find(call.home, address), *value);
+    if (!isToggle) checkWithinLimits(target, *value);
   }
 
   void checkWithinLimits(const CharacteristicData& target, const NDValue& value) {
