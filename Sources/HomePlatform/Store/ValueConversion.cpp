@@ -39,12 +39,18 @@ const IntegerFormat* integerFormat(const NDString& name) {
   return nullptr;
 }
 
-/// The integer nearest to a number, halves away from zero; none beyond 64 bits.
+/// What no document could hold: JSON has neither infinities nor not-a-number, and texts in UTF-8.
+bool isUnwritable(const NDValue& value) {
+  if (value.isText()) return !isUTF8(value.stringValue().view());
+  return value.isFloating() && !std::isfinite(value.floatValue());
+}
+
+/// The integer nearest to a finite number, halves away from zero; none beyond 64 bits.
 std::optional<std::int64_t> rounded(const NDValue& number) {
   if (!number.isFloating()) return number.integerValue();
   constexpr float kBeyond = 9223372036854775808.0F;  // 2^63, which no 64-bit integer reaches
   const float nearest = std::round(number.floatValue());
-  if (!(nearest >= -kBeyond && nearest < kBeyond)) return std::nullopt;  // not-a-number included
+  if (nearest < -kBeyond || nearest >= kBeyond) return std::nullopt;
   return static_cast<std::int64_t>(nearest);
 }
 
@@ -57,16 +63,21 @@ NDValueRef toInteger(const NDValueRef& value, const IntegerFormat& format) {
 }  // namespace
 
 NDValueRef convertToFormat(const NDValueRef& value, const NDString& format) {
-  if (!value || (value->isText() && !isUTF8(value->stringValue().view()))) return nullptr;
-  if (format == "string") return value->isText() ? value : nullptr;
-  const bool isBoolean = format == "bool";
-  const bool isFloating = format == "float";
+  if (!value) return nullptr;
+  const bool isNumber = value->isNumber();
+  if (format == "bool") {
+    if (!isNumber) return nullptr;
+    return value->isBoolean() ? value : NDValue::boolean(value->boolValue());
+  }
+  if (isUnwritable(*value)) return nullptr;
+  if (format == "string") return isNumber ? nullptr : value;
+  if (format == "float") {
+    if (!isNumber) return nullptr;
+    return value->isFloating() ? value : NDValue::floating(value->floatValue());
+  }
   const IntegerFormat* integers = integerFormat(format);
-  if (!isBoolean && !isFloating && !integers) return value;
-  if (value->isText()) return nullptr;
-  if (integers) return toInteger(value, *integers);
-  if (isBoolean) return value->isBoolean() ? value : NDValue::boolean(value->boolValue());
-  return value->isFloating() ? value : NDValue::floating(value->floatValue());
+  if (!integers) return value;
+  return isNumber ? toInteger(value, *integers) : nullptr;
 }
 
 bool isSameValue(const NDValueRef& a, const NDValueRef& b) {

@@ -7,8 +7,8 @@ namespace nidus {
 
 /// Converts `value` to a metadata format: "bool" takes any number (non-zero is true), the integer
 /// formats any number that lies in their range after rounding half away from zero, "float" any
-/// number, "string" a text; no format, or another one, takes anything but null as it is. A text
-/// that is not UTF-8 fits nowhere, as no document and no database may hold it.
+/// number, "string" a text; no format, or another one, takes anything but null as it is. What no
+/// document could hold stays itself nowhere: infinities, not-a-number, texts that are not UTF-8.
 /// Gives null when the value is null or does not fit; the same object when nothing changes.
 [[nodiscard]] NDValueRef convertToFormat(const NDValueRef& value, const NDString& format);
 

@@ -140,6 +140,16 @@ TEST_F(SimulatedDriverTest, WritesWithinLimits) {
   }
 }
 
+TEST_F(SimulatedDriverTest, KeepsItsValueWhereAnInfinityIsWritten) {
+  HomeData home = sampleHome();
+  brightnessOf(home).metadata = std::nullopt;
+  open(home);
+  const float infinity = std::numeric_limits<float>::infinity();
+  EXPECT_THAT(writeOne(brightnessAddress(), NDValue::integer(5)).codes, ElementsAre(0));
+  EXPECT_THAT(writeOne(brightnessAddress(), NDValue::floating(infinity)).codes, ElementsAre(43));
+  EXPECT_EQ(storedValues(*platform_, brightnessAddress()), "5/5");
+}
+
 TEST_F(SimulatedDriverTest, TextLimitsLimitNothing) {
   HomeData home = sampleHome();
   brightnessOf(home).metadata->minimumValue = NDValue::text("low");

@@ -11,6 +11,8 @@ namespace {
 constexpr std::int64_t kLeast = std::numeric_limits<std::int64_t>::min();
 constexpr std::int64_t kGreatest = std::numeric_limits<std::int64_t>::max();
 
+constexpr float kGreatestFloat = std::numeric_limits<float>::max();
+
 NDValueRef integer(std::int64_t value) { return NDValue::integer(value); }
 NDValueRef floating(float value) { return NDValue::floating(value); }
 
@@ -102,7 +104,7 @@ TEST(ConvertToFormatTest, KeepsTheSameObject) {
   };
   const Case cases[] = {
       {"bool", NDValue::boolean(true)}, {"uint8", integer(5)},     {"float", floating(5)},
-      {"string", NDValue::text("")},    {"tlv8", integer(kLeast)}, {"", floating(std::nanf(""))},
+      {"string", NDValue::text("")},    {"tlv8", integer(kLeast)}, {"", floating(kGreatestFloat)},
       {"Bool", NDValue::text("x")},
   };
   for (const auto& [format, value] : cases) EXPECT_EQ(convertToFormat(value, format), value);
@@ -115,6 +117,17 @@ TEST(ConvertToFormatTest, TakesNoTextBesideUTF8) {
     EXPECT_EQ(convertToFormat(NDValue::text("caf\xE9"), format), nullptr) << format;
     EXPECT_NE(convertToFormat(NDValue::text("caf\xC3\xA9"), format), nullptr) << format;
   }
+}
+
+TEST(ConvertToFormatTest, TakesNoInfinityButAsBoolean) {
+  constexpr float kInfinity = std::numeric_limits<float>::infinity();
+  for (const float number : {kInfinity, -kInfinity, std::nanf("")}) {
+    for (const char* format : {"float", "int", "", "tlv8"}) {
+      EXPECT_EQ(convertToFormat(floating(number), format), nullptr) << format << ' ' << number;
+    }
+    EXPECT_TRUE(convertToFormat(floating(number), "bool")->boolValue()) << number;
+  }
+  EXPECT_NE(convertToFormat(floating(kGreatestFloat), "float"), nullptr);
 }
 
 TEST(IsSameValueTest, TellsKindsAndBitsApart) {
