@@ -55,8 +55,7 @@ std::vector<double> leastNanoseconds(const std::vector<Work>& pieces) {
   const double begin = processorTime();
   const double end = begin + static_cast<double>(std::chrono::nanoseconds(rowTime).count());
   std::vector<Piece> measured(pieces.begin(), pieces.end());
-  const int fewestRounds = processorTime() < end ? kFewestRounds : 0;
-  for (int round = 0; round < fewestRounds || processorTime() < end; ++round) {
+  for (int round = 0; round < kFewestRounds || processorTime() < end; ++round) {
     for (Piece& piece : measured) piece.runBatch();
   }
   std::vector<double> least;

@@ -27,6 +27,7 @@ void BM_Sync(benchmark::State& state, std::size_t nameLength, const Row& row) {
   }
   sync.begin(platform);
   if (sync.pullAll() != records.size()) return state.SkipWithError("not an entity for each");
+  sync.end();
   measureRow(
       state, row,
       [&] {
