@@ -46,11 +46,8 @@ void ResultTable::ReportRuns(const std::vector<Run>& runs) {
     if (!rowsOfKind_.empty() && run.family_index != rowsOfKind_.front().family_index) printGrowth();
     if (run.error_occurred) {
       std::printf("%-*s %s\n", kNameWidth, run.benchmark_name().c_str(), run.error_message.c_str());
-    } else if (run.report_big_o) {
-      std::printf("%-*s fitted to the floor: %.2f times", kNameWidth, "",
-                  run.real_accumulated_time);
-    } else if (run.report_rms) {
-      std::printf(", %.0f %% off\n", 100 * run.GetAdjustedRealTime());
+    } else if (run.report_big_o || run.report_rms) {
+      if (areBesideFloor()) printFit(run);
     } else if (run.run_type == Run::RT_Iteration) {
       printRow(run);
       rowsOfKind_.push_back(run);
@@ -82,9 +79,22 @@ void ResultTable::printRow(const Run& run) {
   std::printf("%6.1f  %s\n", goal, count(isMet));
 }
 
+void ResultTable::printFit(const Run& run) {
+  if (run.report_big_o) {
+    std::printf("%-*s fitted to the floor: %.2f times", kNameWidth, "", run.real_accumulated_time);
+  } else {
+    std::printf(", %.0f %% off\n", 100 * run.GetAdjustedRealTime());
+  }
+}
+
+bool ResultTable::areBesideFloor() const {
+  return !rowsOfKind_.empty() && rowsOfKind_.front().counters.contains("floorPower");
+}
+
 void ResultTable::printGrowth() {
+  const bool isTold = areBesideFloor();
   const std::vector<Run> rows = std::exchange(rowsOfKind_, {});
-  if (rows.empty() || !rows.front().counters.contains("floorPower")) return;
+  if (!isTold) return;
   std::vector<ValueAtSize> ratios;
   ratios.reserve(rows.size());
   for (const Run& row : rows) {

@@ -19,6 +19,10 @@ class ResultTable final : public benchmark::BenchmarkReporter {
 
  private:
   void printRow(const Run& run);
+  /// Prints how well ours is a multiple of the floor's times, or how far off that is.
+  static void printFit(const Run& run);
+  /// Whether the rows of this kind have floors to grow beside.
+  [[nodiscard]] bool areBesideFloor() const;
   /// Ends the rows of one kind.
   void printGrowth();
   /// Counts a goal, and gives the word that the table has for it.
