@@ -12,8 +12,8 @@ namespace nidus {
 
 using Work = std::function<void()>;
 
-/// How long the pieces of work of one row are repeated; a piece that takes longer by itself is run
-/// once.
+/// How long the pieces of work of one row are repeated, and each of them five times at least: the
+/// first time may be spent on fetching memory from the system.
 void setTimePerRow(std::chrono::milliseconds time);
 [[nodiscard]] std::chrono::milliseconds timePerRow();
 
